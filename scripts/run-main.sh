@@ -1,0 +1,12 @@
+#!/usr/bin/env bash
+# Installs what is missing, builds a Release copy and runs a few conversions.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+bash scripts/install-deps.sh
+cmake -S . -B build/release -DCMAKE_BUILD_TYPE=Release
+cmake --build build/release -j "$(nproc)" --target pigmo_cli
+pigmo=build/release/apps/cli/pigmo
+set -x
+"$pigmo" translate lab srgb 100 0 0
+"$pigmo" translate srgb lab 255 255 255
+"$pigmo" translate lab lch 50 20 -30
