@@ -2,8 +2,10 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <vector>
 
+#include "ChromaticAdaptation.h"
 #include "ColorSpace.h"
 #include "ColorSpaceStruct.h"
 #include "DataCollection.h"
@@ -16,19 +18,35 @@ inline constexpr int32_t kTranslatorRefused = 83;
 // chain of nodes that meet in CIE XYZ (white Y = 1). Translate allocates nothing.
 class PIGMO_API cColorTranslator {
 public:
+    // Which node operation a chain step calls.
+    enum Operation : int32_t {
+        kConvert = 0,
+        kToXYZ = 1,
+        kFromXYZ = 2,
+        kToSpectral = 3,
+        kFromSpectral = 4,
+        kToComponents = 5,
+        kFromComponents = 6
+    };
+
     cColorTranslator();
     ~cColorTranslator();
     cColorTranslator(const cColorTranslator&) = delete;
     cColorTranslator& operator=(const cColorTranslator&) = delete;
 
+    // Each setter keeps a clone and rebuilds when the other side is set; returns Build()'s result or 0.
     int32_t SetSource(const ColorSpaceStruct& description);
     int32_t SetDestination(const ColorSpaceStruct& description);
     void SetAdaptation(int32_t method);  // 0 none, 1 XYZ scaling, 2 Bradford, 3 Sharp, 4 CMCCAT2000, 5 CAT02
     void SetClampLabSource(bool clamp) { clampLabSource_ = clamp; }
-    int32_t Build();  // 0, or kTranslatorRefused
+    // 0, or kTranslatorRefused. A refused pair is also marked failed, so Translate reports it.
+    int32_t Build();
 
-    // 0 on success, 1 when the pair cannot be converted (out untouched).
+    // 0 on success, 1 when the pair cannot be converted (out untouched). in holds the source's
+    // channel count of values, out the destination's.
     int32_t Translate(const double* in, double* out);
+    // Rows of in into rows of out (resized); the collections' descriptions replace the engine's
+    // when they differ. Stops at the first failing row and returns its status.
     int32_t TranslateCollection(const cDataCollection& in, cDataCollection& out);
 
     const ColorSpaceStruct* Source() const { return source_.get(); }
@@ -37,19 +55,25 @@ public:
     bool IsFailed() const { return failed_; }
     int32_t NodeCount() const { return static_cast<int32_t>(nodes_.size()); }
     const cColorSpace* Node(int32_t index) const { return nodes_[index].get(); }
+    int32_t NodeOperation(int32_t index) const { return operations_[index]; }
+    const ChromaticAdaptation* Adaptation() const { return adaptation_ ? &*adaptation_ : nullptr; }
 
 private:
-    // (implementation detail: fields follow)
+    bool BothSidesSet() const;
+    int32_t Validate() const;
+    void MapRanges();
+    void SelectNodes();
+    void Invalidate();
+
     std::unique_ptr<ColorSpaceStruct> source_;
     std::unique_ptr<ColorSpaceStruct> destination_;
     bool identity_ = false;
-    bool failed_ = false;
+    bool failed_ = true;  // nothing to convert until a pair is built
     std::vector<std::unique_ptr<cColorSpace>> nodes_;
     std::vector<int32_t> operations_;
     int32_t adaptationMethod_ = 0;
-    int32_t adaptationStep_ = 0;
-    bool hasAdaptation_ = false;
-    double adaptation_[9] = {};
+    int32_t adaptationStep_ = 0;  // node after which the adaptation applies; -1 for none
+    std::optional<ChromaticAdaptation> adaptation_;
     std::vector<double> inputBuffer_;
     std::vector<double> intermediate_[2];
     std::vector<double> inputScale_, outputScale_, inputOffset_, outputOffset_;

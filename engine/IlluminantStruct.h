@@ -23,4 +23,9 @@ struct PIGMO_API IlluminantStruct {
     // and a record without values equals one with values when the other fields agree.
     bool operator==(const IlluminantStruct& other) const;
     bool operator!=(const IlluminantStruct& other) const { return !(*this == other); }
+
+    // Becomes the illuminant of a kind (daylight and Planckian at temperature kelvin) with its
+    // spectral power table and its relative white for this record's observer; kinds without
+    // data become 0. A computed white replaces the temperature by its correlated temperature.
+    void SetIlluminant(int32_t kind, double temperature);
 };

@@ -10,3 +10,5 @@ set -x
 "$pigmo" translate lab srgb 100 0 0
 "$pigmo" translate srgb lab 255 255 255
 "$pigmo" translate lab lch 50 20 -30
+"$pigmo" palettes
+"$pigmo" book

@@ -16,3 +16,6 @@ cmake -S . -B build/sanitize -DCMAKE_BUILD_TYPE=Debug -DCMAKE_CXX_FLAGS_DEBUG="-
   -DPIGMO_SANITIZE=ON -DPIGMO_BUILD_BENCH=OFF
 cmake --build build/sanitize -j "$jobs"
 ctest --test-dir build/sanitize --output-on-failure -j "$jobs"
+
+# A short, bounded run of every fuzz target under the same sanitizers.
+bash scripts/fuzz-smoke.sh

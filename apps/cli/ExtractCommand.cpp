@@ -1,0 +1,138 @@
+#include <stb/stb_image.h>
+
+#include <cmath>
+#include <cstdio>
+#include <memory>
+#include <nlohmann/json.hpp>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "Commands.h"
+#include "pigmo/bp.h"
+
+namespace {
+
+struct ExtractArguments {
+    std::string image;
+    int count = 10;
+    bool json = false;
+};
+
+struct DominantColor {
+    double lab[3];
+    char hex[8];
+    int centroid;
+};
+
+// RGBA as decoded, one byte per channel, width x height pixels.
+struct DecodedImage {
+    std::unique_ptr<unsigned char, void (*)(void*)> rgba{nullptr, stbi_image_free};
+    int width = 0;
+    int height = 0;
+};
+
+DecodedImage Load(const std::string& path) {
+    DecodedImage image;
+    int channels = 0;
+    image.rgba.reset(stbi_load(path.c_str(), &image.width, &image.height, &channels, 4));
+    if (!image.rgba) {
+        const char* reason = stbi_failure_reason();
+        throw std::runtime_error("cannot read image '" + path + "': " + (reason ? reason : "unknown error"));
+    }
+    return image;
+}
+
+std::vector<DominantColor> Dominant(DecodedImage& image, int count) {
+    // The extraction reads byte 0 as padding and then red, green, blue: turn RGBA into ARGB in place.
+    unsigned char* pixel = image.rgba.get();
+    const size_t pixels = static_cast<size_t>(image.width) * static_cast<size_t>(image.height);
+    for (size_t i = 0; i < pixels; ++i, pixel += 4) {
+        const unsigned char alpha = pixel[3];
+        pixel[3] = pixel[2];
+        pixel[2] = pixel[1];
+        pixel[1] = pixel[0];
+        pixel[0] = alpha;
+    }
+    std::vector<double> lab(3 * static_cast<size_t>(count));
+    int found = 0;
+    BPImageExtractLab(image.rgba.get(), image.width, image.height, count, lab.data(), &found);
+    std::vector<DominantColor> colors;
+    for (int i = 0; i < found; ++i) {
+        const double* mean = &lab[3 * static_cast<size_t>(i)];
+        // Once no group stands apart the last pick repeats; the repeats say nothing new.
+        if (i > 0 && mean[0] == mean[-3] && mean[1] == mean[-2] && mean[2] == mean[-1]) break;
+        DominantColor color{{mean[0], mean[1], mean[2]}, {}, BPCentroidGetForLab(mean)};
+        double rgb[3];
+        if (BPConvertLab2sRGB(mean, rgb) != 1 || color.centroid < 1) {
+            throw std::runtime_error("a dominant color could not be converted");
+        }
+        std::snprintf(color.hex, sizeof color.hex, "#%02X%02X%02X",
+                      static_cast<unsigned>(std::lround(rgb[0])), static_cast<unsigned>(std::lround(rgb[1])),
+                      static_cast<unsigned>(std::lround(rgb[2])));
+        colors.push_back(color);
+    }
+    return colors;
+}
+
+void PrintJson(const ExtractArguments& arguments, const DecodedImage& image,
+               const std::vector<DominantColor>& colors) {
+    nlohmann::json list = nlohmann::json::array();
+    for (const DominantColor& color : colors) {
+        list.push_back({{"lab", {color.lab[0], color.lab[1], color.lab[2]}},
+                        {"srgb", color.hex},
+                        {"centroid", color.centroid},
+                        {"name", BPCentroidGetName(color.centroid)},
+                        {"category", BPCentroidGetCategoryName(BPCentroidGetCategory(color.centroid))}});
+    }
+    const nlohmann::json document = {
+        {"image", arguments.image}, {"width", image.width}, {"height", image.height}, {"colors", list}};
+    std::printf("%s\n", document.dump(2).c_str());
+}
+
+void PrintText(const std::vector<DominantColor>& colors) {
+    std::printf("#   L*      a*       b*       sRGB     ISCC-NBS name\n");
+    for (size_t i = 0; i < colors.size(); ++i) {
+        const DominantColor& color = colors[i];
+        std::printf("%-3zu %-7.2f %-8.2f %-8.2f %s  %s\n", i + 1, color.lab[0], color.lab[1], color.lab[2],
+                    color.hex, BPCentroidGetName(color.centroid));
+    }
+}
+
+int RunExtract(const ExtractArguments& arguments) {
+    try {
+        DecodedImage image = Load(arguments.image);
+        const std::vector<DominantColor> colors = Dominant(image, arguments.count);
+        if (arguments.json) {
+            PrintJson(arguments, image, colors);
+        } else {
+            PrintText(colors);
+        }
+        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
+        return 0;
+    } catch (const std::exception& e) {
+        std::fflush(stdout);
+        std::fprintf(stderr, "pigmo extract: %s\n", e.what());
+        return 1;
+    }
+}
+
+}  // namespace
+
+void AddExtractCommand(CLI::App& app, int& exitCode) {
+    auto arguments = std::make_shared<ExtractArguments>();
+    CLI::App* command = app.add_subcommand("extract", "Dominant colors of an image");
+    command->add_option("IMAGE", arguments->image, "PNG, JPEG, BMP or TGA file")->required();
+    command->add_option("-n,--count", arguments->count, "How many colors, at most")
+        ->check(CLI::Range(1, 267))
+        ->capture_default_str();
+    command->add_flag("--json", arguments->json, "Print a JSON document instead of a table");
+    command->footer(
+        "Samples every second pixel in each direction, groups the samples by nearest ISCC-NBS centroid and"
+        " picks the largest group, then each time the group farthest from those picked, weighted by its"
+        " size. Each color is the mean CIELAB (D50 white) of its group, shown with its sRGB hex code and the"
+        " name of its nearest centroid. Fewer colors come out when fewer groups stand apart. Transparency is"
+        " ignored.\n"
+        "Example: pigmo extract photo.jpg -n 5");
+    command->callback([arguments, &exitCode] { exitCode = RunExtract(*arguments); });
+}

@@ -1,0 +1,75 @@
+#include <cstdio>
+#include <map>
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "Commands.h"
+#include "DescriptionOptions.h"
+#include "pigmo/bp.h"
+
+namespace {
+
+struct HarmonyArguments {
+    std::string kind;
+    std::vector<std::string> lab;
+};
+
+using PairHarmony = int (*)(const double*, double*, double*);
+
+const std::map<std::string, PairHarmony> kPairHarmonies = {
+    {"monochromatic", BPHarmonyGetMonochromatic},
+    {"near", BPHarmonyGetNearNeighbor},
+    {"far", BPHarmonyGetFarNeighbor},
+    {"triadic", BPHarmonyGetTriadic},
+};
+
+int RunHarmony(const HarmonyArguments& arguments) {
+    try {
+        if (arguments.lab.size() != 3) {
+            throw std::invalid_argument("expected 3 values (L a b), got " +
+                                        std::to_string(arguments.lab.size()));
+        }
+        const double lab[3] = {ParseNumber(arguments.lab[0]), ParseNumber(arguments.lab[1]),
+                               ParseNumber(arguments.lab[2])};
+        double out[2][3];
+        int count = 1;
+        int status = 0;
+        if (arguments.kind == "complement") {
+            status = BPHarmonyGetComplement(lab, out[0]);
+        } else {
+            const auto found = kPairHarmonies.find(arguments.kind);
+            if (found == kPairHarmonies.end()) {
+                throw std::invalid_argument("unknown harmony '" + arguments.kind +
+                                            "' (one of monochromatic, near, far, triadic, complement)");
+            }
+            status = found->second(lab, out[0], out[1]);
+            count = 2;
+        }
+        if (status != 1) throw std::runtime_error("the color could not be converted");
+        for (int i = 0; i < count; ++i) std::printf("%.10g %.10g %.10g\n", out[i][0], out[i][1], out[i][2]);
+        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
+        return 0;
+    } catch (const std::exception& e) {
+        std::fflush(stdout);
+        std::fprintf(stderr, "pigmo harmony: %s\n", e.what());
+        return 1;
+    }
+}
+
+}  // namespace
+
+void AddHarmonyCommand(CLI::App& app, int& exitCode) {
+    auto arguments = std::make_shared<HarmonyArguments>();
+    CLI::App* command = app.add_subcommand("harmony", "Harmonious companions of one CIELAB color");
+    command->add_option("KIND", arguments->kind, "monochromatic, near, far, triadic or complement")
+        ->required();
+    command->add_option("LAB", arguments->lab, "L a b of the color")->required();
+    command->footer(
+        "Hues turn on a twelve-sector painter's wheel: near by 30 degrees, triadic by 120, far by 150 (each "
+        "both ways, printed minus first), complement by 180; monochromatic changes lightness only. Each"
+        " companion is printed as L a b on one line.\n"
+        "Example: pigmo harmony complement 60 30 20");
+    command->callback([arguments, &exitCode] { exitCode = RunHarmony(*arguments); });
+}

@@ -1,0 +1,1 @@
+pigmo_add_bench(catalogue_bench SOURCES CatalogueBench.cpp LIBS pigmo_api)

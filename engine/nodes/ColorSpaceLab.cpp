@@ -1,0 +1,46 @@
+#include "ColorSpaceLab.h"
+
+#include <cmath>
+
+namespace {
+constexpr double kSixteenOver116 = 0.13793103448275862;
+constexpr double kSlope = 7.7867;
+// The long-established rounded constants, not 6/29 and (6/29)^3: stored colors depend on them.
+constexpr double kFThreshold = 0.2069;
+constexpr double kXYZThreshold = 0.008856;
+
+double ForwardF(double t) {
+    return t > kXYZThreshold ? std::pow(t, 0.3333333333333333) : kSlope * t + kSixteenOver116;
+}
+}  // namespace
+
+cColorSpaceLab::cColorSpaceLab(const ColorSpaceStruct& description) {
+    const double* white = description.EffectiveWhite();
+    for (int i = 0; i < 3; ++i) white_[i] = white[i];
+}
+
+void cColorSpaceLab::LabToF(const double* lab, double* f) {
+    const double fy = (lab[0] + 16.0) / 116.0;
+    f[0] = lab[1] / 500.0 + fy;
+    f[1] = fy;
+    f[2] = fy - lab[2] / 200.0;
+}
+
+double cColorSpaceLab::InverseF(double t, double cube) {
+    return t > kFThreshold ? cube : (t - kSixteenOver116) / kSlope;
+}
+
+void cColorSpaceLab::ToXYZ(const double* in, double* out) {
+    double f[3];
+    LabToF(in, f);
+    for (int i = 0; i < 3; ++i) out[i] = white_[i] * InverseF(f[i], std::pow(f[i], 3.0));
+}
+
+void cColorSpaceLab::FromXYZ(const double* in, double* out) {
+    const double fx = ForwardF(in[0] / white_[0]);
+    const double fy = ForwardF(in[1] / white_[1]);
+    const double fz = ForwardF(in[2] / white_[2]);
+    out[0] = 116.0 * fy - 16.0;
+    out[1] = 500.0 * (fx - fy);
+    out[2] = 200.0 * (fy - fz);
+}

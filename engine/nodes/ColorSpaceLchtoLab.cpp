@@ -1,0 +1,5 @@
+#include "ColorSpaceLchtoLab.h"
+
+void cColorSpaceLchtoLab::Convert(const double* in, double* out) {
+    LchToLab(in, out);
+}

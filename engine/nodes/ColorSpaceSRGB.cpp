@@ -1,0 +1,47 @@
+#include "ColorSpaceSRGB.h"
+
+#include <cmath>
+
+namespace {
+double DecodeSRGB(double c) {
+    return c > 0.04045 ? std::pow((c + 0.055) / 1.055, 2.4) : c / 12.92;
+}
+}  // namespace
+
+// Four-decimal coefficients, as stored colors were computed with them.
+void cColorSpaceSRGB::LinearToXYZ(const double* rgb, double* xyz) {
+    const double r = rgb[0];
+    const double g = rgb[1];
+    const double b = rgb[2];
+    xyz[0] = 0.4124 * r + 0.3576 * g + 0.1805 * b;
+    xyz[1] = 0.2126 * r + 0.7152 * g + 0.0722 * b;
+    xyz[2] = 0.0193 * r + 0.1192 * g + 0.9505 * b;
+}
+
+void cColorSpaceSRGB::XYZToLinear(const double* xyz, double* rgb) {
+    const double x = xyz[0];
+    const double y = xyz[1];
+    const double z = xyz[2];
+    rgb[0] = 3.2406 * x - 1.5372 * y - 0.4986 * z;
+    rgb[1] = -0.9689 * x + 1.8758 * y + 0.0415 * z;
+    rgb[2] = 0.0557 * x - 0.204 * y + 1.057 * z;
+}
+
+double cColorSpaceSRGB::EncodeSRGB(double v) {
+    if (v < 0.0) return 0.0;
+    if (v > 1.0) return 1.0;
+    if (v <= 0.0031308) return 12.92 * v;
+    return 1.055 * std::pow(v, 0.4166666666666667) - 0.055;
+}
+
+void cColorSpaceSRGB::ToXYZ(const double* in, double* out) {
+    const double linear[3] = {DecodeSRGB(in[0] / 255.0), DecodeSRGB(in[1] / 255.0),
+                              DecodeSRGB(in[2] / 255.0)};
+    LinearToXYZ(linear, out);
+}
+
+void cColorSpaceSRGB::FromXYZ(const double* in, double* out) {
+    double linear[3];
+    XYZToLinear(in, linear);
+    for (int i = 0; i < 3; ++i) out[i] = EncodeSRGB(linear[i]) * 255.0;
+}

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "ColorSpace.h"
+
+// sRGB, gamma-encoded on 0..255; its XYZ is relative to the D65 white of the primaries.
+class PIGMO_API cColorSpaceSRGB : public cColorSpace {
+public:
+    void ToXYZ(const double* in, double* out) override;
+    void FromXYZ(const double* in, double* out) override;
+
+    // Gamma-encodes one linear value, clamped to 0..1.
+    static double EncodeSRGB(double v);
+    // The primaries' matrices on linear values 0..1, shared with the linear node.
+    static void LinearToXYZ(const double* rgb, double* xyz);
+    static void XYZToLinear(const double* xyz, double* rgb);
+};

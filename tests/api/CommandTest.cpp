@@ -1,0 +1,83 @@
+// Runs `pigmo delta-e` and `pigmo harmony` and checks their output, errors and exit codes.
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace {
+
+struct CommandCase {
+    const char* name;
+    std::string arguments;  // shell words after "pigmo"
+    std::string input;
+    std::vector<double> expected;  // every number printed, in order; empty for errors
+    std::string error;             // part of the one stderr line; empty for success
+};
+
+void PrintTo(const CommandCase& c, std::ostream* os) {
+    *os << c.name;
+}
+
+std::string Slurp(const std::filesystem::path& path) {
+    std::ifstream file(path);
+    std::stringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+const CommandCase kCases[] = {
+    {"ciede2000_default", "delta-e 50 2.6772 -79.7751 50 0 -82.7485", "", {2.0425}, ""},
+    {"cmc_weights", "delta-e -m cmc -w 2,1 50 20 -30 55 18 -25", "", {3.42184}, ""},
+    {"squared", "delta-e -m squared 50 0 0 50 3 4", "", {25}, ""},
+    {"pairs_from_stdin", "delta-e -m cie76", "50 0 0 50 3 4\n\n50,0,0, 50,0,-2\n", {5, 2}, ""},
+    {"complement", "harmony complement 60 34.64101615 20", "", {60, -37.6146, 13.6067}, ""},
+    {"monochromatic", "harmony monochromatic 50 10 10", "", {17, 10, 10, 83, 10, 10}, ""},
+    {"unknown_metric", "delta-e -m cie2000 1 2 3 4 5 6", "", {}, "unknown metric 'cie2000'"},
+    {"weights_not_for_cie76", "delta-e -m cie76 -w 1,1 1 2 3 4 5 6", "", {}, "cie76 takes no weights"},
+    {"wrong_weight_count", "delta-e -m ciede2000 -w 1,1 1 2 3 4 5 6", "", {}, "takes 3 weights"},
+    {"five_values", "delta-e 1 2 3 4 5", "", {}, "expected 6 values"},
+    {"not_a_number", "delta-e 1 2 3 4 5 abc", "", {}, "'abc' is not a number"},
+    // Nothing of a failing stream is half-printed: the good first line is kept, the error names line 2.
+    {"bad_stdin_line", "delta-e -m cie76", "50 0 0 50 3 4\n1 2 3\n", {5}, "line 2: expected 6 values"},
+    {"unknown_harmony", "harmony opposite 50 10 10", "", {}, "unknown harmony 'opposite'"},
+    {"harmony_value_count", "harmony near 50 10", "", {}, "expected 3 values"},
+};
+
+class Commands : public testing::TestWithParam<CommandCase> {};
+
+TEST_P(Commands, PrintTheValuesOrOneErrorLine) {
+    const CommandCase& c = GetParam();
+    char pattern[] = "/tmp/pigmo-api-command-XXXXXX";
+    const std::filesystem::path dir = mkdtemp(pattern);
+    std::ofstream(dir / "in") << c.input;
+    const std::string command = std::string("'") + PIGMO_CLI + "' " + c.arguments + " <" +
+                                (dir / "in").string() + " >" + (dir / "out").string() + " 2>" +
+                                (dir / "err").string();
+    const int status = std::system(command.c_str());
+    const std::string out = Slurp(dir / "out"), err = Slurp(dir / "err");
+    std::filesystem::remove_all(dir);
+
+    ASSERT_TRUE(WIFEXITED(status));
+    EXPECT_EQ(WEXITSTATUS(status) == 0, c.error.empty()) << err;
+    std::istringstream numbers(out);
+    std::vector<double> printed;
+    for (double v; numbers >> v;) printed.push_back(v);
+    ASSERT_EQ(printed.size(), c.expected.size()) << out;
+    for (size_t i = 0; i < printed.size(); ++i) EXPECT_NEAR(printed[i], c.expected[i], 5e-5) << i;
+    if (!c.error.empty()) {
+        EXPECT_NE(err.find(c.error), std::string::npos) << err;
+        EXPECT_EQ(std::count(err.begin(), err.end(), '\n'), 1) << err;
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(DeltaEAndHarmony, Commands, testing::ValuesIn(kCases),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+}  // namespace

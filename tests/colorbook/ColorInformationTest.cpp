@@ -1,0 +1,133 @@
+#include <gtest/gtest.h>
+#include <pigmo/bp.h>
+
+#include <memory>
+#include <vector>
+
+#include "ColorInformation.h"
+
+namespace {
+
+using Pigmo::ColorInformation;
+
+enum class Curve { None, Ones36, Ramp35, NullCount1, NullCount36 };
+enum class LabFrom { Given, Curve, RGB, Zero };
+enum class LinearFrom { Given, Curve, Zero };
+
+struct RecordCase {
+    const char* label;
+    const float* lab;
+    const float* rgb;
+    Curve curve;
+    LabFrom labFrom;
+    LinearFrom linearFrom;
+    int storedCount;
+};
+
+const float kLab50[3] = {50, 0, 0};
+const float kRGB[3] = {255, 127.5f, 0};
+// sRGB (1, 0.5, 0) decoded: the sRGB transfer function's published midpoint 0.214041.
+const float kRGBLinear[3] = {1.0f, 0.214041f, 0.0f};
+
+std::vector<float> CurveValues(Curve curve) {
+    if (curve == Curve::Ones36) return std::vector<float>(36, 1.0f);
+    std::vector<float> ramp(35);
+    for (int i = 0; i < 35; ++i) ramp[i] = 0.02f * static_cast<float>(i);
+    return ramp;
+}
+
+class RecordConstruction : public testing::TestWithParam<RecordCase> {};
+
+TEST_P(RecordConstruction, DerivesWhatTheBookLeavesOut) {
+    const RecordCase& c = GetParam();
+    std::vector<float> values = CurveValues(c.curve);
+    const bool nullValues =
+        c.curve == Curve::None || c.curve == Curve::NullCount1 || c.curve == Curve::NullCount36;
+    const int count = c.curve == Curve::None          ? 0
+                      : c.curve == Curve::NullCount1  ? 1
+                      : c.curve == Curve::NullCount36 ? 36
+                                                      : static_cast<int>(values.size());
+    const ColorInformation record("n", "c", c.lab, c.rgb, nullValues ? nullptr : values.data(), count,
+                                  nullptr);
+
+    std::vector<double> curve(values.begin(), values.end());
+    double lab[3] = {0, 0, 0};
+    if (c.labFrom == LabFrom::Given) {
+        for (int i = 0; i < 3; ++i) lab[i] = c.lab[i];
+    } else if (c.labFrom == LabFrom::Curve) {
+        ASSERT_EQ(BPConvert36BandSpectral2LabD502(curve.data(), lab), 1);
+    } else if (c.labFrom == LabFrom::RGB) {
+        const double rgb[3] = {c.rgb[0], c.rgb[1], c.rgb[2]};
+        ASSERT_EQ(BPConvertsRGB2Lab(rgb, lab), 1);
+    }
+    double sRGB[3];
+    ASSERT_EQ(BPConvertLab2sRGB(lab, sRGB), 1);
+    double linear[3] = {0, 0, 0};
+    if (c.linearFrom == LinearFrom::Given) {
+        for (int i = 0; i < 3; ++i) linear[i] = kRGBLinear[i];
+    } else if (c.linearFrom == LinearFrom::Curve) {
+        ASSERT_EQ(BPConvert36BandSpectral2LinearsRGB(curve.data(), linear), 1);
+        for (double& v : linear) v *= 255.0;
+    }
+
+    for (int i = 0; i < 3; ++i) {
+        EXPECT_NEAR(record.GetLab()[i], lab[i], 1e-4) << "Lab " << i;
+        EXPECT_NEAR(record.GetSRGB()[i], sRGB[i], 1e-3) << "sRGB " << i;
+        EXPECT_NEAR(record.GetLinearRGB()[i], linear[i], 1e-5) << "linear " << i;
+    }
+    EXPECT_EQ(record.GetSpectralReflectanceCount(), c.storedCount);
+    EXPECT_EQ(record.GetSpectralReflectance() == nullptr, c.storedCount == 0);
+    if (c.storedCount > 0) {
+        EXPECT_EQ(record.GetSpectralReflectance()[c.storedCount - 1], values.back());
+    }
+    EXPECT_EQ(record.GetTagCount(), 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, RecordConstruction,
+    testing::Values(
+        RecordCase{"LabOnly", kLab50, nullptr, Curve::None, LabFrom::Given, LinearFrom::Zero, 0},
+        RecordCase{"CurveOnly", nullptr, nullptr, Curve::Ones36, LabFrom::Curve, LinearFrom::Curve, 36},
+        RecordCase{"BookValuesWin", kLab50, kRGB, Curve::Ones36, LabFrom::Given, LinearFrom::Given, 36},
+        RecordCase{"RGBOnly", nullptr, kRGB, Curve::None, LabFrom::RGB, LinearFrom::Given, 0},
+        RecordCase{"CurveBeatsRGBForLab", nullptr, kRGB, Curve::Ones36, LabFrom::Curve, LinearFrom::Given,
+                   36},
+        RecordCase{"Curve35DerivesNothing", nullptr, nullptr, Curve::Ramp35, LabFrom::Zero, LinearFrom::Zero,
+                   35},
+        RecordCase{"NullValuesCount1", nullptr, nullptr, Curve::NullCount1, LabFrom::Zero, LinearFrom::Zero,
+                   0},
+        RecordCase{"NullValuesCount36", nullptr, nullptr, Curve::NullCount36, LabFrom::Zero, LinearFrom::Zero,
+                   0}),
+    [](const testing::TestParamInfo<RecordCase>& info) { return info.param.label; });
+
+TEST(Record, WhiteCurveRendersAboutOne) {
+    const std::vector<float> white(36, 1.0f);
+    const ColorInformation record("white", "c", nullptr, nullptr, white.data(), 36, nullptr);
+    for (int i = 0; i < 3; ++i) EXPECT_NEAR(record.GetLinearRGB()[i], 1.0, 0.02);
+    EXPECT_NEAR(record.GetLab()[0], 100.0, 0.01);
+}
+
+TEST(Record, TagsAndCopiesAreOwned) {
+    const std::vector<std::string> tags = {"first", "second"};
+    const float curve[3] = {0.1f, 0.2f, 0.3f};
+    auto original = std::make_unique<ColorInformation>("name", "category", kLab50, kRGB, curve, 3, &tags);
+    ColorInformation copy = *original;
+    ColorInformation assigned("x", "y", nullptr, nullptr, nullptr, 0, nullptr);
+    assigned = copy;
+    EXPECT_EQ(copy.GetTagCount(), 2);
+    EXPECT_STREQ(copy.GetTag(1), "second");
+    EXPECT_EQ(copy.GetTag(2), nullptr);
+    EXPECT_NE(copy.GetName(), original->GetName());
+    EXPECT_NE(copy.GetSpectralReflectance(), original->GetSpectralReflectance());
+    const std::vector<float> lab(original->GetLab(), original->GetLab() + 3);
+    original.reset();  // the copies must not share its storage
+    for (const ColorInformation* record : {&copy, &assigned}) {
+        EXPECT_STREQ(record->GetName(), "name");
+        EXPECT_STREQ(record->GetCategory(), "category");
+        EXPECT_STREQ(record->GetTag(0), "first");
+        EXPECT_EQ(record->GetSpectralReflectance()[2], 0.3f);
+        EXPECT_EQ(std::vector<float>(record->GetLab(), record->GetLab() + 3), lab);
+    }
+}
+
+}  // namespace
