@@ -33,13 +33,6 @@ constexpr int32_t kGridCells[3] = {8, 12, 12};  // per half
 // Kept candidates may exceed the bound by this much, so rounding at box edges loses none.
 constexpr double kSlack = 1e-6;
 
-double DistanceSquared(const double* x, const double* y) {
-    const double dl = x[0] - y[0];
-    const double da = x[1] - y[1];
-    const double db = x[2] - y[2];
-    return dl * dl + da * da + db * db;
-}
-
 template <size_t N>
 bool Contains(const int32_t (&list)[N], int32_t index) {
     return std::binary_search(std::begin(list), std::end(list), index);
@@ -54,6 +47,13 @@ const cCentroidLookup& cCentroidLookup::Instance() {
 
 int32_t cCentroidLookup::BucketOf(const double* lab) {
     return 4 * (lab[0] > 50.0) + 2 * (lab[1] > 0.0) + (lab[2] > 0.0);
+}
+
+double cCentroidLookup::DistanceSquared(const double* x, const double* y) {
+    const double dl = x[0] - y[0];
+    const double da = x[1] - y[1];
+    const double db = x[2] - y[2];
+    return dl * dl + da * da + db * db;
 }
 
 cCentroidLookup::cCentroidLookup() {
@@ -75,14 +75,13 @@ void cCentroidLookup::BuildGrid(int32_t bucket) {
     for (int32_t axis = 0; axis < 3; ++axis) {
         const bool upper = (bucket >> (2 - axis)) & 1;
         grid.low[axis] = upper ? kGridLow[axis] + kGridHalf[axis] : kGridLow[axis];
-        grid.cells[axis] = kGridCells[axis];
         size[axis] = kGridHalf[axis] / kGridCells[axis];
     }
     const std::vector<int16_t>& members = members_[bucket];
     std::vector<double> nearest(members.size());
-    for (int32_t l = 0; l < grid.cells[0]; ++l) {
-        for (int32_t a = 0; a < grid.cells[1]; ++a) {
-            for (int32_t b = 0; b < grid.cells[2]; ++b) {
+    for (int32_t l = 0; l < kGridCells[0]; ++l) {
+        for (int32_t a = 0; a < kGridCells[1]; ++a) {
+            for (int32_t b = 0; b < kGridCells[2]; ++b) {
                 const int32_t cell[3] = {l, a, b};
                 double low[3], high[3];
                 for (int32_t axis = 0; axis < 3; ++axis) {
@@ -112,13 +111,13 @@ void cCentroidLookup::BuildGrid(int32_t bucket) {
     grid.start.push_back(static_cast<uint32_t>(grid.candidates.size()));
 }
 
-int32_t cCentroidLookup::BoxOf(const Grid& grid, const double* lab) const {
+int32_t cCentroidLookup::BoxOf(const Grid& grid, const double* lab) {
     int32_t box = 0;
     for (int32_t axis = 0; axis < 3; ++axis) {
-        const double size = kGridHalf[axis] / grid.cells[axis];
+        const double size = kGridHalf[axis] / kGridCells[axis];
         const double offset = lab[axis] - grid.low[axis];
         if (!(offset >= 0.0 && offset <= kGridHalf[axis])) return -1;
-        box = box * grid.cells[axis] + std::min(static_cast<int32_t>(offset / size), grid.cells[axis] - 1);
+        box = box * kGridCells[axis] + std::min(static_cast<int32_t>(offset / size), kGridCells[axis] - 1);
     }
     return box;
 }

@@ -13,6 +13,8 @@ public:
 
     // Bucket 0 to 7 of a color: 4 x [L* > 50] + 2 x [a* > 0] + [b* > 0].
     static int32_t BucketOf(const double* lab);
+    // Squared CIE76 difference of two L*, a*, b* triples.
+    static double DistanceSquared(const double* x, const double* y);
 
     // 1-based centroid index with the smallest squared CIE76 distance, the lower index on
     // ties; -1 when a component is not finite.
@@ -26,14 +28,13 @@ private:
     // query compare a handful of centroids instead of the whole bucket.
     struct Grid {
         double low[3];
-        int32_t cells[3];
         std::vector<uint32_t> start;  // per box, into candidates; one extra at the end
         std::vector<int16_t> candidates;
     };
 
     void BuildGrid(int32_t bucket);
     // Box of a color inside the grid, or -1 when it lies beyond.
-    int32_t BoxOf(const Grid& grid, const double* lab) const;
+    static int32_t BoxOf(const Grid& grid, const double* lab);
 
     std::array<std::vector<int16_t>, 8> members_;  // ascending
     std::array<Grid, 8> grids_;

@@ -107,13 +107,6 @@ struct Group {
     double distance = 1e20;
 };
 
-double DistanceSquared(const double* x, const double* y) {
-    const double dl = x[0] - y[0];
-    const double da = x[1] - y[1];
-    const double db = x[2] - y[2];
-    return dl * dl + da * da + db * db;
-}
-
 // Adds the tallied colors to the groups of their nearest centroids, as Lab sums until averaged.
 bool AddToGroups(const ColorTally& tally, std::vector<Group>& groups) {
     const cCentroidLookup& lookup = cCentroidLookup::Instance();
@@ -190,7 +183,8 @@ int SelectDominant(std::vector<Group>& groups, int wanted, double* labOut) {
         double bestScore = 0.0;
         for (Group& group : groups) {
             if (group.count == 0) continue;
-            group.distance = std::min(group.distance, DistanceSquared(group.lab, selected->lab));
+            group.distance =
+                std::min(group.distance, cCentroidLookup::DistanceSquared(group.lab, selected->lab));
             const double score = static_cast<double>(group.count) * group.distance * group.distance;
             if (score > bestScore) {
                 bestScore = score;

@@ -72,8 +72,24 @@ std::vector<unsigned char> MakeImage(Content content) {
     return pixels;
 }
 
+// Distinct colors among the pixels the extraction samples: what its cost grows with.
+size_t DistinctSampled(const std::vector<unsigned char>& pixels) {
+    std::vector<bool> seen(size_t{1} << 24);
+    size_t distinct = 0;
+    for (int y = kHeight - 1; y >= 0; y -= 2) {
+        for (int x = kWidth - 1; x >= 0; x -= 2) {
+            const unsigned char* pixel = &pixels[(static_cast<size_t>(y) * kWidth + x) * 4];
+            const size_t rgb = (size_t{pixel[1]} << 16) | (size_t{pixel[2]} << 8) | pixel[3];
+            distinct += !seen[rgb];
+            seen[rgb] = true;
+        }
+    }
+    return distinct;
+}
+
 void BM_ImageExtractLab(benchmark::State& state) {
     const std::vector<unsigned char> pixels = MakeImage(static_cast<Content>(state.range(0)));
+    state.counters["distinct"] = static_cast<double>(DistinctSampled(pixels));
     double lab[10 * 3];
     int count = 0;
     for (auto _ : state) {

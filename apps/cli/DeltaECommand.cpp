@@ -1,6 +1,5 @@
 #include <cstdio>
 #include <functional>
-#include <iostream>
 #include <map>
 #include <memory>
 #include <sstream>
@@ -10,6 +9,7 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "ValueLines.h"
 #include "pigmo/bp.h"
 
 namespace {
@@ -92,37 +92,12 @@ private:
     std::vector<double> weights_;
 };
 
-std::vector<std::string> Tokens(std::string line) {
-    for (char& c : line) {
-        if (c == ',') c = ' ';
-    }
-    std::istringstream stream(line);
-    std::vector<std::string> tokens;
-    for (std::string token; stream >> token;) tokens.push_back(token);
-    return tokens;
-}
-
 int RunDeltaE(const DeltaEArguments& arguments) {
     try {
         const PairPrinter printer(arguments);
-        if (!arguments.values.empty()) {
-            printer.Print(arguments.values);
-        } else {
-            std::string line;
-            for (int number = 1; std::getline(std::cin, line); ++number) {
-                const std::vector<std::string> values = Tokens(line);
-                if (values.empty()) continue;
-                try {
-                    printer.Print(values);
-                } catch (const std::exception& e) {
-                    throw std::runtime_error("line " + std::to_string(number) + ": " + e.what());
-                }
-            }
-        }
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
+        return ForEachValueLine("delta-e", arguments.values,
+                                [&](const std::vector<std::string>& values) { printer.Print(values); });
     } catch (const std::exception& e) {
-        std::fflush(stdout);
         std::fprintf(stderr, "pigmo delta-e: %s\n", e.what());
         return 1;
     }

@@ -1,7 +1,10 @@
 #include <stb/stb_image.h>
 
+#include <cerrno>
+#include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <cstring>
 #include <memory>
 #include <nlohmann/json.hpp>
 #include <stdexcept>
@@ -15,7 +18,7 @@ namespace {
 
 struct ExtractArguments {
     std::string image;
-    int count = 10;
+    std::string count = "10";
     bool json = false;
 };
 
@@ -33,14 +36,27 @@ struct DecodedImage {
 };
 
 DecodedImage Load(const std::string& path) {
+    const std::unique_ptr<FILE, int (*)(FILE*)> file(std::fopen(path.c_str(), "rb"), std::fclose);
+    if (!file) throw std::runtime_error("cannot open image '" + path + "': " + std::strerror(errno));
     DecodedImage image;
     int channels = 0;
-    image.rgba.reset(stbi_load(path.c_str(), &image.width, &image.height, &channels, 4));
+    image.rgba.reset(stbi_load_from_file(file.get(), &image.width, &image.height, &channels, 4));
     if (!image.rgba) {
         const char* reason = stbi_failure_reason();
-        throw std::runtime_error("cannot read image '" + path + "': " + (reason ? reason : "unknown error"));
+        throw std::runtime_error("cannot decode image '" + path +
+                                 "': " + (reason ? reason : "unknown error"));
     }
     return image;
+}
+
+// The whole text one integer from 1 to 267.
+int ParseCount(const std::string& text) {
+    int value = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);
+    if (error != std::errc() || end != text.data() + text.size() || value < 1 || value > 267) {
+        throw std::invalid_argument("--count: '" + text + "' is not a whole number from 1 to 267");
+    }
+    return value;
 }
 
 std::vector<DominantColor> Dominant(DecodedImage& image, int count) {
@@ -101,8 +117,9 @@ void PrintText(const std::vector<DominantColor>& colors) {
 
 int RunExtract(const ExtractArguments& arguments) {
     try {
+        const int count = ParseCount(arguments.count);
         DecodedImage image = Load(arguments.image);
-        const std::vector<DominantColor> colors = Dominant(image, arguments.count);
+        const std::vector<DominantColor> colors = Dominant(image, count);
         if (arguments.json) {
             PrintJson(arguments, image, colors);
         } else {
@@ -123,8 +140,8 @@ void AddExtractCommand(CLI::App& app, int& exitCode) {
     auto arguments = std::make_shared<ExtractArguments>();
     CLI::App* command = app.add_subcommand("extract", "Dominant colors of an image");
     command->add_option("IMAGE", arguments->image, "PNG, JPEG, BMP or TGA file")->required();
-    command->add_option("-n,--count", arguments->count, "How many colors, at most")
-        ->check(CLI::Range(1, 267))
+    command->add_option("-n,--count", arguments->count, "How many colors, at most (1 to 267)")
+        ->type_name("N")
         ->capture_default_str();
     command->add_flag("--json", arguments->json, "Print a JSON document instead of a table");
     command->footer(

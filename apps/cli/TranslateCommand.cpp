@@ -1,5 +1,4 @@
 #include <cstdio>
-#include <iostream>
 #include <memory>
 #include <nlohmann/json.hpp>
 #include <stdexcept>
@@ -9,6 +8,7 @@
 #include "ColorTranslator.h"
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "ValueLines.h"
 
 namespace {
 
@@ -92,42 +92,12 @@ private:
     std::vector<double> out_;
 };
 
-// Values of one input line, separated by blanks or commas.
-std::vector<std::string> SplitLine(const std::string& line) {
-    std::vector<std::string> values;
-    std::string current;
-    for (char c : line + ' ') {
-        if (c == ' ' || c == '\t' || c == ',' || c == '\r') {
-            if (!current.empty()) values.push_back(current);
-            current.clear();
-        } else {
-            current += c;
-        }
-    }
-    return values;
-}
-
 int RunTranslate(const TranslateArguments& arguments) {
     try {
         ColorLineConverter converter(arguments);
-        if (!arguments.values.empty()) {
-            converter.Convert(arguments.values);
-        } else {
-            std::string line;
-            for (int number = 1; std::getline(std::cin, line); ++number) {
-                const std::vector<std::string> values = SplitLine(line);
-                if (values.empty()) continue;
-                try {
-                    converter.Convert(values);
-                } catch (const std::exception& e) {
-                    throw std::runtime_error("line " + std::to_string(number) + ": " + e.what());
-                }
-            }
-        }
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
+        return ForEachValueLine("translate", arguments.values,
+                                [&](const std::vector<std::string>& values) { converter.Convert(values); });
     } catch (const std::exception& e) {
-        std::fflush(stdout);
         std::fprintf(stderr, "pigmo translate: %s\n", e.what());
         return 1;
     }

@@ -11,6 +11,8 @@
 #include <string>
 #include <vector>
 
+#include "RunPigmo.h"
+
 namespace {
 
 struct CommandCase {
@@ -23,13 +25,6 @@ struct CommandCase {
 
 void PrintTo(const CommandCase& c, std::ostream* os) {
     *os << c.name;
-}
-
-std::string Slurp(const std::filesystem::path& path) {
-    std::ifstream file(path);
-    std::stringstream text;
-    text << file.rdbuf();
-    return text.str();
 }
 
 const CommandCase kCases[] = {
@@ -54,18 +49,12 @@ class Commands : public testing::TestWithParam<CommandCase> {};
 
 TEST_P(Commands, PrintTheValuesOrOneErrorLine) {
     const CommandCase& c = GetParam();
-    char pattern[] = "/tmp/pigmo-api-command-XXXXXX";
-    const std::filesystem::path dir = mkdtemp(pattern);
-    std::ofstream(dir / "in") << c.input;
-    const std::string command = std::string("'") + PIGMO_CLI + "' " + c.arguments + " <" +
-                                (dir / "in").string() + " >" + (dir / "out").string() + " 2>" +
-                                (dir / "err").string();
-    const int status = std::system(command.c_str());
-    const std::string out = Slurp(dir / "out"), err = Slurp(dir / "err");
-    std::filesystem::remove_all(dir);
+    const RunResult run = RunPigmo(c.arguments, c.input);
+    const std::string& out = run.out;
+    const std::string& err = run.err;
 
-    ASSERT_TRUE(WIFEXITED(status));
-    EXPECT_EQ(WEXITSTATUS(status) == 0, c.error.empty()) << err;
+    ASSERT_NE(run.exitCode, -1);
+    EXPECT_EQ(run.exitCode == 0, c.error.empty()) << err;
     std::istringstream numbers(out);
     std::vector<double> printed;
     for (double v; numbers >> v;) printed.push_back(v);

@@ -12,36 +12,15 @@
 #include <string>
 #include <vector>
 
+#include "RunPigmo.h"
+
 namespace {
-
-struct RunResult {
-    int exitCode = -1;
-    std::string out;
-    std::string err;
-};
-
-std::string ReadFile(const std::filesystem::path& path) {
-    std::ifstream file(path);
-    std::stringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
 
 // Runs "pigmo translate ARGS" with INPUT on standard input.
 RunResult RunTranslate(const std::vector<std::string>& args, const std::string& input = "") {
-    char pattern[] = "/tmp/pigmo-cli-test-XXXXXX";
-    const std::filesystem::path dir = mkdtemp(pattern);
-    std::ofstream(dir / "in") << input;
-    std::string command = std::string("'") + PIGMO_CLI + "' translate";
-    for (const std::string& a : args) command += " '" + a + "'";
-    command += " <" + (dir / "in").string() + " >" + (dir / "out").string() + " 2>" + (dir / "err").string();
-    const int status = std::system(command.c_str());
-    RunResult result;
-    result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    result.out = ReadFile(dir / "out");
-    result.err = ReadFile(dir / "err");
-    std::filesystem::remove_all(dir);
-    return result;
+    std::string arguments = "translate";
+    for (const std::string& a : args) arguments += " '" + a + "'";
+    return RunPigmo(arguments, input);
 }
 
 std::vector<std::vector<double>> ParseLines(const std::string& text) {

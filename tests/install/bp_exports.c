@@ -1,8 +1,10 @@
-/* An outside C program against the installed pigmo/bp.h: every conversion, difference and harmony
-   export, checked against known values. Prints one line per failed check; exits 0 when all pass. */
+/* An outside C program against the installed pigmo/bp.h: every conversion, difference, harmony
+   and catalogue export, checked against known values. Prints one line per failed check; exits 0 when all
+   pass. */
 #include <math.h>
 #include <pigmo/bp.h>
 #include <stdio.h>
+#include <string.h>
 
 static int failures = 0;
 
@@ -106,10 +108,40 @@ static void CheckHarmonies(void) {
     Check("BPHarmonyGetMonochromatic", (const double[]){out1[0], out2[0]}, (const double[]){17, 83}, 2, 1e-9);
 }
 
+static void CheckText(const char* what, const char* got, const char* want) {
+    if (got == NULL || strcmp(got, want) != 0) {
+        printf("FAIL %s: \"%s\", expected \"%s\"\n", what, got ? got : "(null)", want);
+        ++failures;
+    }
+}
+
+static void CheckCatalogue(void) {
+    CheckStatus("BPCentroidGetCount", BPCentroidGetCount(), 267);
+    CheckStatus("BPCentroidGetCategoryCount", BPCentroidGetCategoryCount(), 19);
+    CheckStatus("BPCentroidGetCategory", BPCentroidGetCategory(263), 19);
+    CheckText("BPCentroidGetName(1)", BPCentroidGetName(1), "Vivid Pink");
+    CheckText("BPCentroidGetName(268)", BPCentroidGetName(268), "Black");
+    CheckText("BPCentroidGetCategoryName(20)", BPCentroidGetCategoryName(20), "White/Gray/Black");
+    Check("BPCentroidGetLab", BPCentroidGetLab(1), (const double[]){80.656948, 27.535981, 8.233154}, 3, 1e-9);
+    CheckStatus("BPCentroidGetForLab", BPCentroidGetForLab(BPCentroidGetLab(1)), 1);
+
+    /* A white 2 x 2 image: one group, repeated for every requested colour. */
+    unsigned char white[16];
+    for (int i = 0; i < 16; ++i) white[i] = 255;
+    double lab[9];
+    int count = -1;
+    BPImageExtractLab(white, 2, 2, 3, lab, &count);
+    CheckStatus("BPImageExtractLab count", count, 3);
+    Check("BPImageExtractLab", lab + 6, (const double[]){100, -2.3829, -19.3737}, 3, 5e-5);
+    BPImageExtractLab(white, 0, 2, 3, lab, &count);
+    CheckStatus("BPImageExtractLab empty", count, 0);
+}
+
 int main(void) {
     CheckConversions();
     CheckDifferences();
     CheckHarmonies();
+    CheckCatalogue();
     if (failures == 0) printf("bp exports ok\n");
     return failures == 0 ? 0 : 1;
 }

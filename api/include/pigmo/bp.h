@@ -65,8 +65,9 @@ PIGMO_BP_API const char* BPCentroidGetCategoryName(int category);
 PIGMO_BP_API const char* BPCentroidGetName(int centroid);
 /* L*, a*, b* of a centroid (D50 white). */
 PIGMO_BP_API const double* BPCentroidGetLab(int centroid);
-/* Nearest centroid (squared CIE76) among those sharing the color's L* = 50, a* = 0, b* = 0
-   octant or lying near its borders; -1 for a null pointer or a NaN component. */
+/* Nearest centroid (squared CIE76, the lower index on ties) among those sharing the color's
+   L* = 50, a* = 0, b* = 0 octant or lying near its borders; -1 for a null pointer or a
+   component that is not finite. */
 PIGMO_BP_API int BPCentroidGetForLab(const double* lab);
 /* Dominant colors of an image of 4-byte pixels (byte 0 ignored, then red, green, blue), row
    after row, sampled every second pixel: writes colourCount L*, a*, b* triples (10 when

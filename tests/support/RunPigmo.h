@@ -1,0 +1,40 @@
+#pragma once
+
+// Runs the built pigmo binary (PIGMO_CLI) as a shell command and collects what it prints.
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <string>
+
+struct RunResult {
+    int exitCode = -1;  // -1 when the program did not exit normally
+    std::string out;
+    std::string err;
+};
+
+inline std::string ReadWholeFile(const std::filesystem::path& path) {
+    std::ifstream file(path);
+    std::stringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+// ARGUMENTS are shell words after "pigmo"; INPUT goes to standard input.
+inline RunResult RunPigmo(const std::string& arguments, const std::string& input = "") {
+    char pattern[] = "/tmp/pigmo-cli-test-XXXXXX";
+    const std::filesystem::path dir = mkdtemp(pattern);
+    std::ofstream(dir / "in") << input;
+    const std::string command = std::string("'") + PIGMO_CLI + "' " + arguments + " <'" + (dir / "in").string() +
+                                "' >'" + (dir / "out").string() + "' 2>'" + (dir / "err").string() + "'";
+    const int status = std::system(command.c_str());
+    RunResult result;
+    result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    result.out = ReadWholeFile(dir / "out");
+    result.err = ReadWholeFile(dir / "err");
+    std::filesystem::remove_all(dir);
+    return result;
+}
