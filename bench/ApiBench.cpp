@@ -2,12 +2,10 @@
 #include <benchmark/benchmark.h>
 #include <lcms2.h>
 
-#include <cstdio>
-#include <map>
 #include <random>
-#include <string>
 #include <vector>
 
+#include "RatioReporter.h"
 #include "pigmo/bp.h"
 
 namespace {
@@ -114,40 +112,11 @@ BENCHMARK(LittleCmsConversion<false>)->Name("LittleCmssRGB2Lab");
 BENCHMARK(PigmoConversion<BPConvert36BandSpectral2LabD502, &Inputs::spectra, 36>)
     ->Name("PigmoSpectral2LabD50");
 
-// Console output plus, at the end, how many times slower Little CMS is than Pigmo for each shared task
-// (CPU time, which other load on the machine disturbs less than wall time).
-class RatioReporter : public benchmark::ConsoleReporter {
-public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type == Run::RT_Iteration)
-                nanosecondsPerCall_[run.benchmark_name()] = run.GetAdjustedCPUTime();
-        }
-        ConsoleReporter::ReportRuns(runs);
-    }
-
-    void Finalize() override {
-        ConsoleReporter::Finalize();
-        for (const char* task : {"DeltaE2000", "Lab2sRGB", "sRGB2Lab"}) {
-            const auto pigmo = nanosecondsPerCall_.find(std::string("Pigmo") + task);
-            const auto lcms = nanosecondsPerCall_.find(std::string("LittleCms") + task);
-            if (pigmo == nanosecondsPerCall_.end() || lcms == nanosecondsPerCall_.end()) continue;
-            std::printf("%-12s Pigmo %8.1f ns, Little CMS %8.1f ns per call: Little CMS / Pigmo = %.2f\n",
-                        task, pigmo->second, lcms->second, lcms->second / pigmo->second);
-        }
-    }
-
-private:
-    std::map<std::string, double> nanosecondsPerCall_;
-};
-
 }  // namespace
 
 int main(int argc, char** argv) {
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-    RatioReporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    benchmark::Shutdown();
-    return 0;
+    return Pigmo::Bench::RunBenchmarks(argc, argv,
+                                       {{"DeltaE2000", "PigmoDeltaE2000", "LittleCmsDeltaE2000"},
+                                        {"Lab2sRGB", "PigmoLab2sRGB", "LittleCmsLab2sRGB"},
+                                        {"sRGB2Lab", "PigmosRGB2Lab", "LittleCmssRGB2Lab"}});
 }

@@ -6,6 +6,7 @@
 #include <random>
 #include <vector>
 
+#include "RatioReporter.h"
 #include "pigmo/bp.h"
 
 namespace {
@@ -108,4 +109,6 @@ BENCHMARK(BM_ImageExtractLab)
 
 }  // namespace
 
-BENCHMARK_MAIN();
+int main(int argc, char** argv) {
+    return Pigmo::Bench::RunBenchmarks(argc, argv);
+}

@@ -2,14 +2,12 @@
 #include <benchmark/benchmark.h>
 #include <lcms2.h>
 
-#include <cstdio>
-#include <map>
-#include <string>
 #include <vector>
 
 #include "ColorSpaceCIECAM02.h"
 #include "ColorSpaceStruct.h"
 #include "ColorTranslator.h"
+#include "RatioReporter.h"
 
 namespace {
 
@@ -105,39 +103,9 @@ BENCHMARK(PigmoNode);
 BENCHMARK(PigmoTranslator);
 BENCHMARK(LittleCms);
 
-// Keeps each run's time per color so the ratios can be printed after the table.
-class RatioReporter : public benchmark::ConsoleReporter {
-public:
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            const auto items = run.counters.find("items_per_second");
-            if (items != run.counters.end() && items->second.value > 0)
-                nanosPerColor_[run.benchmark_name()] = 1e9 / items->second.value;
-        }
-        ConsoleReporter::ReportRuns(runs);
-    }
-    void PrintRatios() const {
-        const auto lcms = nanosPerColor_.find("LittleCms");
-        if (lcms == nanosPerColor_.end()) return;
-        for (const auto& [name, nanos] : nanosPerColor_) {
-            if (name != lcms->first)
-                std::printf("%s / LittleCms: %.2f (%.1f ns vs %.1f ns per color)\n", name.c_str(),
-                            nanos / lcms->second, nanos, lcms->second);
-        }
-    }
-
-private:
-    std::map<std::string, double> nanosPerColor_;
-};
-
 }  // namespace
 
 int main(int argc, char** argv) {
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-    RatioReporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    reporter.PrintRatios();
-    benchmark::Shutdown();
-    return 0;
+    return Pigmo::Bench::RunBenchmarks(
+        argc, argv, {{"node", "PigmoNode", "LittleCms"}, {"translator", "PigmoTranslator", "LittleCms"}});
 }

@@ -15,6 +15,7 @@
 #include <vector>
 
 #include "ColorBookReader.h"
+#include "RatioReporter.h"
 
 namespace {
 
@@ -118,9 +119,5 @@ void operator delete[](void* block, std::size_t) noexcept {
 int main(int argc, char** argv) {
     // The document's own allocations count too.
     pugi::set_memory_management_functions(CountedAllocate, CountedFree);
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-    benchmark::RunSpecifiedBenchmarks();
-    benchmark::Shutdown();
-    return 0;
+    return Pigmo::Bench::RunBenchmarks(argc, argv);
 }

@@ -4,13 +4,14 @@
 #include <benchmark/benchmark.h>
 #include <lcms2.h>
 
+#include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <random>
 #include <vector>
 
 #include "ColorSpaceSpectral.h"
 #include "ColorTranslator.h"
+#include "RatioReporter.h"
 
 namespace {
 
@@ -112,4 +113,7 @@ BENCHMARK(BM_NodeConstruction)
 
 }  // namespace
 
-BENCHMARK_MAIN();
+int main(int argc, char** argv) {
+    return Pigmo::Bench::RunBenchmarks(
+        argc, argv, {{"spectrum to Lab", "BM_SpectrumToLab/weighting:4", "BM_SpectrumToLabWithLcmsLab"}});
+}

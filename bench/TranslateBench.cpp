@@ -2,17 +2,15 @@
 // and in batches, with a summary of the time ratios at the end.
 #include <benchmark/benchmark.h>
 #include <lcms2.h>
-#include <unistd.h>
 
-#include <cstdio>
 #include <functional>
-#include <map>
 #include <memory>
 #include <random>
 #include <string>
 #include <vector>
 
 #include "ColorTranslator.h"
+#include "RatioReporter.h"
 
 namespace {
 
@@ -172,51 +170,19 @@ void RegisterAll() {
     RegisterBenchmark("LabToLCh/lcms/batch", LcmsLchBatch)->Unit(benchmark::kMillisecond);
 }
 
-// Keeps the CPU time per color of every run and prints both engines side by side at the end.
-class RatioReporter : public benchmark::ConsoleReporter {
-public:
-    // Colors only on a terminal, so logs stay plain text.
-    RatioReporter() : ConsoleReporter(isatty(STDOUT_FILENO) ? OO_ColorTabular : OO_Tabular) {}
-
-    void ReportRuns(const std::vector<Run>& runs) override {
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred || run.iterations == 0) continue;
-            const std::string name = run.benchmark_name();
-            const double colors = name.ends_with("/batch") ? static_cast<double>(kBatch) : 1.0;
-            // CPU time: on a shared machine the wall clock also counts other processes.
-            nsPerColor_[name] = run.cpu_accumulated_time * 1e9 / static_cast<double>(run.iterations) / colors;
-        }
-        ConsoleReporter::ReportRuns(runs);
+std::vector<Pigmo::Bench::RatioPair> Pairs() {
+    std::vector<Pigmo::Bench::RatioPair> pairs;
+    for (const std::string conversion : kConversions) {
+        for (const std::string mode : {"color", "batch"})
+            pairs.push_back(
+                {conversion + " " + mode, conversion + "/pigmo/" + mode, conversion + "/lcms/" + mode});
     }
-
-    void PrintSummary() const {
-        std::printf("\n%-10s %-6s %14s %14s %12s\n", "conversion", "mode", "pigmo CPU ns", "lcms CPU ns",
-                    "lcms/pigmo");
-        for (const char* conversion : kConversions) {
-            for (const char* mode : {"color", "batch"}) {
-                const auto pigmo = nsPerColor_.find(std::string(conversion) + "/pigmo/" + mode);
-                const auto lcms = nsPerColor_.find(std::string(conversion) + "/lcms/" + mode);
-                if (pigmo == nsPerColor_.end() || lcms == nsPerColor_.end()) continue;
-                std::printf("%-10s %-6s %14.2f %14.2f %12.2f\n", conversion, mode, pigmo->second,
-                            lcms->second, lcms->second / pigmo->second);
-            }
-        }
-        std::printf("lcms/pigmo above 1: Translate is faster than Little CMS.\n");
-    }
-
-private:
-    std::map<std::string, double> nsPerColor_;
-};
+    return pairs;
+}
 
 }  // namespace
 
 int main(int argc, char** argv) {
     RegisterAll();
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-    RatioReporter reporter;
-    benchmark::RunSpecifiedBenchmarks(&reporter);
-    reporter.PrintSummary();
-    benchmark::Shutdown();
-    return 0;
+    return Pigmo::Bench::RunBenchmarks(argc, argv, Pairs());
 }

@@ -18,10 +18,13 @@ for corpus in tests/fuzz/corpus/*/; do
   [ -f "tests/fuzz/$name.dict" ] && options+=(-dict="tests/fuzz/$name.dict")
   echo "Fuzzing $name for ${seconds}s"
   status=0
-  "$build/tests/fuzz/fuzz_$name" "${options[@]}" "$scratch" "$corpus" || status=$?
+  log="$build/fuzz_$name.log"
+  "$build/tests/fuzz/fuzz_$name" "${options[@]}" "$scratch" "$corpus" >"$log" 2>&1 || status=$?
   rm -rf "$scratch"
   if [ "$status" -ne 0 ]; then
+    tail -n 60 "$log" >&2
     echo "fuzz_$name failed; the input is in $build/" >&2
     exit "$status"
   fi
+  grep -E '^Done [0-9]+ runs' "$log" || true
 done

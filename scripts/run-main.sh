@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Installs what is missing, builds a Release copy and runs a few conversions.
+# Installs what is missing, builds a Release copy, runs a few conversions and lists the default color book.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 bash scripts/install-deps.sh

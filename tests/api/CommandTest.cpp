@@ -1,12 +1,7 @@
 // Runs `pigmo delta-e` and `pigmo harmony` and checks their output, errors and exit codes.
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <algorithm>
-#include <cstdlib>
-#include <filesystem>
-#include <fstream>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -22,10 +17,6 @@ struct CommandCase {
     std::vector<double> expected;  // every number printed, in order; empty for errors
     std::string error;             // part of the one stderr line; empty for success
 };
-
-void PrintTo(const CommandCase& c, std::ostream* os) {
-    *os << c.name;
-}
 
 const CommandCase kCases[] = {
     {"ciede2000_default", "delta-e 50 2.6772 -79.7751 50 0 -82.7485", "", {2.0425}, ""},
@@ -44,6 +35,10 @@ const CommandCase kCases[] = {
     {"unknown_harmony", "harmony opposite 50 10 10", "", {}, "unknown harmony 'opposite'"},
     {"harmony_value_count", "harmony near 50 10", "", {}, "expected 3 values"},
 };
+
+void PrintTo(const CommandCase& c, std::ostream* os) {
+    *os << c.name;
+}
 
 class Commands : public testing::TestWithParam<CommandCase> {};
 

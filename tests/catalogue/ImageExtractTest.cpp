@@ -7,6 +7,7 @@
 #include <functional>
 #include <map>
 #include <thread>
+#include <tuple>
 #include <vector>
 
 #include "pigmo/bp.h"
@@ -135,16 +136,15 @@ TEST(ImageExtract, ColourCountBelowOneMeansTen) {
 
 TEST(ImageExtract, NothingToSampleGivesCountZero) {
     const auto pixels = MakeImage(2, 2, [](int, int) { return kRed; });
-    struct Case {
-        const unsigned char* pixels;
-        int width, height;
-    };
-    for (const Case& c : {Case{pixels.data(), 0, 2}, Case{pixels.data(), 2, 0}, Case{pixels.data(), -3, 2},
-                          Case{pixels.data(), 2, -1}, Case{nullptr, 2, 2}}) {
+    for (const auto& [image, width, height] : {std::tuple{pixels.data(), 0, 2},
+                                               {pixels.data(), 2, 0},
+                                               {pixels.data(), -3, 2},
+                                               {pixels.data(), 2, -1},
+                                               {nullptr, 2, 2}}) {
         double lab[3] = {-7.0, -7.0, -7.0};
         int count = 99;
-        BPImageExtractLab(c.pixels, c.width, c.height, 1, lab, &count);
-        EXPECT_EQ(count, 0) << c.width << "x" << c.height;
+        BPImageExtractLab(image, width, height, 1, lab, &count);
+        EXPECT_EQ(count, 0) << width << "x" << height;
         EXPECT_EQ(lab[0], -7.0);
     }
     int count = 99;

@@ -15,16 +15,12 @@ namespace {
 
 using Pigmo::ColorInformation;
 
-const std::string kCurve20 = [] {
+std::string Points(int count, const std::string& value) {
     std::string points;
-    for (int i = 0; i < 20; ++i) points += "<CxF:ReflectancePoint>0.5</CxF:ReflectancePoint>";
+    for (int i = 0; i < count; ++i) points += "<CxF:ReflectancePoint>" + value + "</CxF:ReflectancePoint>";
     return points;
-}();
-const std::string kCurve16 = [] {
-    std::string points;
-    for (int i = 0; i < 16; ++i) points += "<CxF:ReflectancePoint>0.25</CxF:ReflectancePoint>";
-    return points;
-}();
+}
+const std::string kCurve20 = Points(20, "0.5"), kCurve16 = Points(16, "0.25");
 
 std::vector<double> Curve36() {
     std::vector<double> curve(20, 0.5);
@@ -37,120 +33,77 @@ enum class LabFrom { Given, Curve, RGB };
 struct ColorCase {
     const char* label;
     std::string xml;
-    const char* name;
-    const char* category;
-    LabFrom labFrom;
-    float lab[3];  // the given CIELAB, or the sRGB (0..255) it is derived from
-    float linear[3];
-    int curveCount;
-    std::vector<std::string> tags;
+    const char* name = "Unnamed";
+    const char* category = "Default";
+    LabFrom labFrom = LabFrom::Given;
+    float lab[3] = {};  // the given CIELAB, or the sRGB (0..255) it is derived from
+    float linear[3] = {};
+    int curveCount = 0;
+    std::vector<std::string> tags = {};
 };
+
+std::string Attribute(const std::string& name, const std::string& values) {
+    return "<CxF:CustomAttribute><CxF:Name>" + name + "</CxF:Name><CxF:ValueChoice>" + values +
+           "</CxF:ValueChoice></CxF:CustomAttribute>";
+}
 
 const std::vector<ColorCase>& ColorCases() {
     static const std::vector<ColorCase> cases = {
-        {"OnlyName", R"(<CxF:Color ColorName="Plain"/>)", "Plain", "Default", LabFrom::Given, {}, {}, 0, {}},
-        {"NoName", "<CxF:Color/>", "Unnamed", "Default", LabFrom::Given, {}, {}, 0, {}},
-        {"EmptyName", R"(<CxF:Color ColorName=""/>)", "", "Default", LabFrom::Given, {}, {}, 0, {}},
-        {"SRGBAsAtofReadsIt",
-         "<CxF:Color><CxF:ColorSpaceSRGB><CxF:Red>0.5</CxF:Red><CxF:Green>1</CxF:Green><CxF:Blue>abc</"
-         "CxF:Blue>"
-         "</CxF:ColorSpaceSRGB></CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::RGB,
-         {127.5f, 255, 0},
-         {0.214041f, 1, 0},
-         0,
-         {}},
-        {"IncompleteLabLeavesCurve",
-         "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>50</CxF:L><CxF:A>1</CxF:A></CxF:ColorSpaceCIELab>"
-         "<CxF:ColorSpaceSpectral>" +
-             kCurve20 + "</CxF:ColorSpaceSpectral><CxF:ColorSpaceSpectral>" + kCurve16 +
-             "</CxF:ColorSpaceSpectral></CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Curve,
-         {},
-         {},
-         36,
-         {}},
-        {"OnePointIsNoCurve",
-         "<CxF:Color><CxF:ColorSpaceSpectral><CxF:ReflectancePoint>0.5</CxF:ReflectancePoint>"
-         "</CxF:ColorSpaceSpectral></CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Given,
-         {},
-         {},
-         0,
-         {}},
-        {"TagsAccumulateCategoryReplaced",
-         "<CxF:Color>"
-         "<CxF:CustomAttribute><CxF:Name>tags</CxF:Name><CxF:ValueChoice><CxF:StringValue>a</CxF:StringValue>"
-         "<CxF:StringValue/><CxF:StringValue>b</CxF:StringValue></CxF:ValueChoice></CxF:CustomAttribute>"
-         "<CxF:CustomAttribute><CxF:Name>category</CxF:Name><CxF:ValueChoice><CxF:StringValue>first"
-         "</CxF:StringValue></CxF:ValueChoice></CxF:CustomAttribute>"
-         "<CxF:CustomAttribute><CxF:Name>tags</CxF:Name><CxF:ValueChoice><CxF:StringValue><![CDATA[c<d]]>"
-         "</CxF:StringValue></CxF:ValueChoice></CxF:CustomAttribute>"
-         "<CxF:CustomAttribute><CxF:Name>category</CxF:Name><CxF:ValueChoice><CxF:StringValue>second"
-         "</CxF:StringValue></CxF:ValueChoice></CxF:CustomAttribute>"
-         "<CxF:CustomAttribute><CxF:Name>category</CxF:Name><CxF:ValueChoice/></CxF:CustomAttribute>"
-         "<CxF:CustomAttribute><CxF:Name>Tags</CxF:Name><CxF:ValueChoice><CxF:StringValue>x</CxF:StringValue>"
-         "</CxF:ValueChoice></CxF:CustomAttribute></CxF:Color>",
-         "Unnamed",
-         "second",
-         LabFrom::Given,
-         {},
-         {},
-         0,
-         {"a", "b", "c<d"}},
-        {"NumbersReadAsAtofWithoutOverflow",
-         "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>  12.5abc</CxF:L><CxF:A>nan</CxF:A><CxF:B>1e999</CxF:B>"
-         "</CxF:ColorSpaceCIELab><CxF:ColorSpaceCIELab><CxF:L>-inf</CxF:L><CxF:A/></CxF:ColorSpaceCIELab>"
-         "</CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Given,
-         {12.5f, 0, 0},
-         {},
-         0,
-         {}},
-        {"LaterCompleteLabWins",
-         "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>10</CxF:L><CxF:A>2</CxF:A><CxF:B>3</CxF:B></"
-         "CxF:ColorSpaceCIELab>"
-         "<CxF:ColorSpaceCIELab><CxF:B>9</CxF:B><CxF:A>8</CxF:A><CxF:L>70</CxF:L><CxF:L>1</CxF:L>"
-         "</CxF:ColorSpaceCIELab></CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Given,
-         {70, 8, 9},
-         {},
-         0,
-         {}},
-        {"NonTextFirstChildHasNoText",
-         "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L><!-- measured -->40</CxF:L><CxF:A><x/>5</CxF:A>"
-         "<CxF:B>6</CxF:B></CxF:ColorSpaceCIELab><CxF:CustomAttribute><CxF:Name><!-- c -->category</CxF:Name>"
-         "<CxF:ValueChoice><CxF:StringValue>hidden</CxF:StringValue></CxF:ValueChoice></CxF:CustomAttribute>"
-         "</CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Given,
-         {0, 0, 6},
-         {},
-         0,
-         {}},
-        {"OtherPrefixesAreNotTheBooks",
-         R"(<CxF:Color xmlns:cc="http://colorexchangeformat.com/v2"><cc:ColorSpaceCIELab><cc:L>5</cc:L>)"
-         "<cc:A>5</cc:A><cc:B>5</cc:B></cc:ColorSpaceCIELab><ColorSpaceCIELab><L>5</L><A>5</A><B>5</B>"
-         "</ColorSpaceCIELab><CxF:colorspacecielab><CxF:L>5</CxF:L><CxF:A>5</CxF:A><CxF:B>5</CxF:B>"
-         "</CxF:colorspacecielab></CxF:Color>",
-         "Unnamed",
-         "Default",
-         LabFrom::Given,
-         {},
-         {},
-         0,
-         {}},
+        {.label = "OnlyName", .xml = R"(<CxF:Color ColorName="Plain"/>)", .name = "Plain"},
+        {.label = "NoName", .xml = "<CxF:Color/>"},
+        {.label = "EmptyName", .xml = R"(<CxF:Color ColorName=""/>)", .name = ""},
+        {.label = "SRGBAsAtofReadsIt",
+         .xml = "<CxF:Color><CxF:ColorSpaceSRGB><CxF:Red>0.5</CxF:Red><CxF:Green>1</CxF:Green>"
+                "<CxF:Blue>abc</CxF:Blue></CxF:ColorSpaceSRGB></CxF:Color>",
+         .labFrom = LabFrom::RGB,
+         .lab = {127.5f, 255, 0},
+         .linear = {0.214041f, 1, 0}},
+        {.label = "IncompleteLabLeavesCurve",
+         .xml = "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>50</CxF:L><CxF:A>1</CxF:A></CxF:ColorSpaceCIELab>"
+                "<CxF:ColorSpaceSpectral>" +
+                kCurve20 + "</CxF:ColorSpaceSpectral><CxF:ColorSpaceSpectral>" + kCurve16 +
+                "</CxF:ColorSpaceSpectral></CxF:Color>",
+         .labFrom = LabFrom::Curve,
+         .curveCount = 36},
+        {.label = "OnePointIsNoCurve",
+         .xml = "<CxF:Color><CxF:ColorSpaceSpectral><CxF:ReflectancePoint>0.5</CxF:ReflectancePoint>"
+                "</CxF:ColorSpaceSpectral></CxF:Color>"},
+        {.label = "TagsAccumulateCategoryReplaced",
+         .xml = "<CxF:Color>" +
+                Attribute("tags",
+                          "<CxF:StringValue>a</CxF:StringValue><CxF:StringValue/>"
+                          "<CxF:StringValue>b</CxF:StringValue>") +
+                Attribute("category", "<CxF:StringValue>first</CxF:StringValue>") +
+                Attribute("tags", "<CxF:StringValue><![CDATA[c<d]]></CxF:StringValue>") +
+                Attribute("category", "<CxF:StringValue>second</CxF:StringValue>") +
+                "<CxF:CustomAttribute><CxF:Name>category</CxF:Name><CxF:ValueChoice/></CxF:CustomAttribute>" +
+                Attribute("Tags", "<CxF:StringValue>x</CxF:StringValue>") + "</CxF:Color>",
+         .category = "second",
+         .tags = {"a", "b", "c<d"}},
+        {.label = "NumbersReadAsAtofWithoutOverflow",
+         .xml =
+             "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>  12.5abc</CxF:L><CxF:A>nan</CxF:A><CxF:B>1e999</CxF:B>"
+             "</CxF:ColorSpaceCIELab><CxF:ColorSpaceCIELab><CxF:L>-inf</CxF:L><CxF:A/></CxF:ColorSpaceCIELab>"
+             "</CxF:Color>",
+         .lab = {12.5f, 0, 0}},
+        {.label = "LaterCompleteLabWins",
+         .xml =
+             "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L>10</CxF:L><CxF:A>2</CxF:A><CxF:B>3</CxF:B>"
+             "</CxF:ColorSpaceCIELab><CxF:ColorSpaceCIELab><CxF:B>9</CxF:B><CxF:A>8</CxF:A><CxF:L>70</CxF:L>"
+             "<CxF:L>1</CxF:L></CxF:ColorSpaceCIELab></CxF:Color>",
+         .lab = {70, 8, 9}},
+        {.label = "NonTextFirstChildHasNoText",
+         .xml = "<CxF:Color><CxF:ColorSpaceCIELab><CxF:L><!-- measured -->40</CxF:L><CxF:A><x/>5</CxF:A>"
+                "<CxF:B>6</CxF:B></CxF:ColorSpaceCIELab><CxF:CustomAttribute><CxF:Name><!-- c -->category"
+                "</CxF:Name><CxF:ValueChoice><CxF:StringValue>hidden</CxF:StringValue></CxF:ValueChoice>"
+                "</CxF:CustomAttribute></CxF:Color>",
+         .lab = {0, 0, 6}},
+        {.label = "OtherPrefixesAreNotTheBooks",
+         .xml =
+             R"(<CxF:Color xmlns:cc="http://colorexchangeformat.com/v2"><cc:ColorSpaceCIELab><cc:L>5</cc:L>)"
+             "<cc:A>5</cc:A><cc:B>5</cc:B></cc:ColorSpaceCIELab><ColorSpaceCIELab><L>5</L><A>5</A><B>5</B>"
+             "</ColorSpaceCIELab><CxF:colorspacecielab><CxF:L>5</CxF:L><CxF:A>5</CxF:A><CxF:B>5</CxF:B>"
+             "</CxF:colorspacecielab></CxF:Color>"},
     };
     return cases;
 }

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -39,15 +40,13 @@ class Discovery : public BookFolder {
 protected:
     void SetUp() override {
         BookFolder::SetUp();
-        const char* xdg = std::getenv("XDG_DATA_HOME");
-        savedXdg_ = xdg != nullptr ? xdg : "";
-        hadXdg_ = xdg != nullptr;
+        if (const char* xdg = std::getenv("XDG_DATA_HOME")) savedXdg_ = xdg;
         setenv("XDG_DATA_HOME", (root_ + "/data").c_str(), 1);
         RegistryStore::Instance().Clear();
     }
     void TearDown() override {
-        if (hadXdg_)
-            setenv("XDG_DATA_HOME", savedXdg_.c_str(), 1);
+        if (savedXdg_)
+            setenv("XDG_DATA_HOME", savedXdg_->c_str(), 1);
         else
             unsetenv("XDG_DATA_HOME");
         RegistryStore::Instance().Reset();
@@ -60,8 +59,7 @@ protected:
         return Write("data/Pigmo/Tintora/User/" + name, content);
     }
 
-    std::string savedXdg_;
-    bool hadXdg_ = false;
+    std::optional<std::string> savedXdg_;
 };
 
 TEST_F(Discovery, SystemPalettesComeFirstThenTheUsers) {

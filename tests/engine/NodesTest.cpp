@@ -6,7 +6,6 @@
 #include "ColorSpaceLab.h"
 #include "ColorSpaceLch.h"
 #include "ColorSpaceLinearRIMM.h"
-#include "ColorSpaceLinearSRGB.h"
 #include "ColorSpaceSRGB.h"
 #include "ColorSpaceYxy.h"
 
@@ -132,16 +131,6 @@ TEST(SRGBNode, RoundTripWithinEightBitRounding) {
             }
         }
     }
-}
-
-TEST(LinearSRGBNode, ReadsBytesWritesUnit) {
-    cColorSpaceLinearSRGB linear;
-    Triple xyz{};
-    Triple rgb{};
-    linear.ToXYZ(Triple{255, 255, 255}.data(), xyz.data());
-    ExpectNear(xyz, {0.9505, 1.0, 1.089}, 1e-12);
-    linear.FromXYZ(xyz.data(), rgb.data());
-    ExpectNear(rgb, {1.0, 1.0, 1.0}, 1e-4);
 }
 
 TEST(YxyNode, BlackAndZeroY) {

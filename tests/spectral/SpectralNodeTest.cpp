@@ -64,29 +64,23 @@ TEST(SpectralNode, MethodsAgreeClosely) {
 }
 
 TEST(SpectralNode, ModeSelection) {
+    using M = SpectralIntegration;
     const struct {
         ColorSpaceStruct description;
         SpectralIntegration mode;
     } cases[] = {
-        {Spectral(380, 730, 10, 4), SpectralIntegration::Sprague},
-        {Spectral(380, 730, 5, 4), SpectralIntegration::Sprague},
-        {Spectral(380, 720, 20, 4), SpectralIntegration::OneNanometre},
-        {Spectral(380.5, 730.5, 10, 4), SpectralIntegration::OneNanometre},
-        {Spectral(380.5, 730.5, 10, 5), SpectralIntegration::OneNanometre},
-        {Spectral(380, 730, 10, 5), SpectralIntegration::Lagrange},
-        {Spectral(380, 730, 10, 1), SpectralIntegration::OneNanometre},
-        {Spectral(380, 730, 10, 0), SpectralIntegration::Direct},
-        {Spectral(380, 730, 10, 7), SpectralIntegration::Direct},
-        {Spectral(380, 730, 10, 2), SpectralIntegration::FixedTable},
-        {Spectral(380, 730, 10, 3), SpectralIntegration::FixedTable},
-        {Spectral(380, 730, 10, 2, 3, 0), SpectralIntegration::FixedTable},
-        {Spectral(380, 730, 10, 2, 13, 0), SpectralIntegration::FixedTable},
-        {Spectral(380, 730, 10, 3, 3, 0), SpectralIntegration::Sprague},
-        {Spectral(380, 730, 10, 2, 1, 6504), SpectralIntegration::Sprague},
-        {Spectral(380, 730, 10, 2, 1, 5003, 1), SpectralIntegration::Sprague},
-        {Spectral(385, 735, 10, 2), SpectralIntegration::Sprague},
-        {Spectral(380, 720, 20, 2), SpectralIntegration::OneNanometre},
-        {Spectral(380, 420, 10, 4), SpectralIntegration::OneNanometre},  // too few bands for the end kernel
+        // clang-format off
+        {Spectral(380, 730, 10, 4), M::Sprague},           {Spectral(380, 730, 5, 4), M::Sprague},
+        {Spectral(380, 720, 20, 4), M::OneNanometre},      {Spectral(380.5, 730.5, 10, 4), M::OneNanometre},
+        {Spectral(380.5, 730.5, 10, 5), M::OneNanometre},  {Spectral(380, 730, 10, 5), M::Lagrange},
+        {Spectral(380, 730, 10, 1), M::OneNanometre},      {Spectral(380, 730, 10, 0), M::Direct},
+        {Spectral(380, 730, 10, 7), M::Direct},            {Spectral(380, 730, 10, 2), M::FixedTable},
+        {Spectral(380, 730, 10, 3), M::FixedTable},        {Spectral(380, 730, 10, 2, 3, 0), M::FixedTable},
+        {Spectral(380, 730, 10, 2, 13, 0), M::FixedTable}, {Spectral(380, 730, 10, 3, 3, 0), M::Sprague},
+        {Spectral(380, 730, 10, 2, 1, 6504), M::Sprague},  {Spectral(380, 730, 10, 2, 1, 5003, 1), M::Sprague},
+        {Spectral(385, 735, 10, 2), M::Sprague},           {Spectral(380, 720, 20, 2), M::OneNanometre},
+        {Spectral(380, 420, 10, 4), M::OneNanometre},  // too few bands for the end kernel
+        // clang-format on
     };
     for (const auto& c : cases) {
         const cColorSpaceSpectral node(c.description, c.description);
