@@ -42,15 +42,10 @@ EngineSetup SpectralToLabD50() {
     return {BookSpectrum(1, 5003.0), lab};
 }
 
-// Linear sRGB on 0..1 at the white the sRGB node itself reaches: XYZ of full scale, normalised to Y = 1.
+// Linear sRGB on 0..1 at the white the sRGB node itself reaches.
 ColorSpaceStruct LinearSRGBAtSRGBWhite() {
-    const double full[3] = {255.0, 255.0, 255.0};
-    double xyz[3];
-    cColorSpaceSRGB().ToXYZ(full, xyz);
     ColorSpaceStruct linear = Described(25);
-    linear.whitePoint[0] = xyz[0] / xyz[1];
-    linear.whitePoint[1] = 1.0;
-    linear.whitePoint[2] = xyz[2] / xyz[1];
+    cColorSpaceSRGB::White(linear.whitePoint);
     for (int32_t channel = 0; channel < 3; ++channel) linear.SetMaximum(channel, 1.0);
     return linear;
 }

@@ -1,3 +1,4 @@
+#include "CentroidLookup.h"
 #include "ColorDifference.h"
 #include "pigmo/bp.h"
 
@@ -32,10 +33,7 @@ double BPCalculateDeltaE2000(const double* lab1, const double* lab2, double kL, 
 
 double BPCalculateDistanceSquared(const double* lab1, const double* lab2) {
     if (lab1 == nullptr || lab2 == nullptr) return kNoColor;
-    const double dL = lab1[0] - lab2[0];
-    const double da = lab1[1] - lab2[1];
-    const double db = lab1[2] - lab2[2];
-    return dL * dL + da * da + db * db;
+    return cCentroidLookup::DistanceSquared(lab1, lab2);
 }
 
 }  // extern "C"

@@ -4,14 +4,11 @@
 
 #include <cmath>
 
+#include "ColorSpaceSRGB.h"
+
 namespace Pigmo {
 
 namespace {
-
-// The sRGB transfer function, from an encoded value on 0..1 to a linear one.
-double DecodeSRGB(double c) {
-    return c > 0.04045 ? std::pow((c + 0.055) / 1.055, 2.4) : c / 12.92;
-}
 
 // Stores a conversion's result; what overflows a float cannot be shown or rendered, so it is 0.
 void Store(const double* in, float* out) {
@@ -54,7 +51,7 @@ ColorInformation::ColorInformation(const char* name, const char* category, const
 
     if (rgb != nullptr) {
         // Book sRGB is encoded on 0..255; the map renders linear values on 0..1.
-        for (int i = 0; i < 3; ++i) in[i] = DecodeSRGB(rgb[i] / 255.0);
+        for (int i = 0; i < 3; ++i) in[i] = cColorSpaceSRGB::DecodeSRGB(rgb[i] / 255.0);
         Store(in, linearRGB_);
     } else if (bands) {
         // The conversion answers on a 1/255 scale.

@@ -67,7 +67,6 @@ std::vector<std::string> CollectPalettePaths(std::size_t* systemCount) {
     HANDLE search = INVALID_HANDLE_VALUE;
     if (FindFirstSystemPalette(folder, found, search)) CollectSearch(folder, found, search, paths);
     if (systemCount != nullptr) *systemCount = paths.size();
-    search = INVALID_HANDLE_VALUE;
     if (FindFirstUserPalette(folder, found, search)) CollectSearch(folder, found, search, paths);
     return paths;
 }

@@ -31,6 +31,25 @@ constexpr NodeOperation kOperations[] = {
     &cColorSpace::FromComponents,
 };
 
+// Per channel, value' = offset + value * scale from the declared range onto the code's default one
+// (toDefault) or back.
+void MapChannels(const ColorSpaceStruct& d, bool toDefault, std::vector<double>& scale,
+                 std::vector<double>& offset) {
+    const int32_t count = d.GetChannelCount();
+    scale.resize(count);
+    offset.resize(count);
+    for (int32_t i = 0; i < count; ++i) {
+        const double defaultMin = ColorSpaceStruct::DefaultMinimum(d.type, i);
+        const double defaultMax = ColorSpaceStruct::DefaultMaximum(d.type, i);
+        const double fromMin = toDefault ? d.GetMinimum(i) : defaultMin;
+        const double fromMax = toDefault ? d.GetMaximum(i) : defaultMax;
+        const double toMin = toDefault ? defaultMin : d.GetMinimum(i);
+        const double toMax = toDefault ? defaultMax : d.GetMaximum(i);
+        scale[i] = (toMax - toMin) / (fromMax - fromMin);
+        offset[i] = toMin - fromMin * scale[i];
+    }
+}
+
 // --- Node selection: the one place that maps codes to nodes. ---
 
 // Node of a space that can stand at either end of a chain through XYZ; null when none is built.
@@ -199,28 +218,8 @@ void cColorTranslator::SelectNodes() {
 
 void cColorTranslator::MapRanges() {
     // Values in a declared range are mapped onto the default range of the code, the nodes' scale.
-    if (!source_->HasDefaultRanges()) {
-        const int32_t count = source_->GetChannelCount();
-        inputScale_.resize(count);
-        inputOffset_.resize(count);
-        for (int32_t i = 0; i < count; ++i) {
-            const double dmin = ColorSpaceStruct::DefaultMinimum(source_->type, i);
-            const double dmax = ColorSpaceStruct::DefaultMaximum(source_->type, i);
-            inputScale_[i] = (dmax - dmin) / (source_->GetMaximum(i) - source_->GetMinimum(i));
-            inputOffset_[i] = dmin - source_->GetMinimum(i) * inputScale_[i];
-        }
-    }
-    if (!destination_->HasDefaultRanges()) {
-        const int32_t count = destination_->GetChannelCount();
-        outputScale_.resize(count);
-        outputOffset_.resize(count);
-        for (int32_t i = 0; i < count; ++i) {
-            const double dmin = ColorSpaceStruct::DefaultMinimum(destination_->type, i);
-            const double dmax = ColorSpaceStruct::DefaultMaximum(destination_->type, i);
-            outputScale_[i] = (destination_->GetMaximum(i) - destination_->GetMinimum(i)) / (dmax - dmin);
-            outputOffset_[i] = destination_->GetMinimum(i) - dmin * outputScale_[i];
-        }
-    }
+    if (!source_->HasDefaultRanges()) MapChannels(*source_, true, inputScale_, inputOffset_);
+    if (!destination_->HasDefaultRanges()) MapChannels(*destination_, false, outputScale_, outputOffset_);
 }
 
 int32_t cColorTranslator::Translate(const double* in, double* out) {

@@ -10,6 +10,7 @@
 #include "Commands.h"
 #include "PaletteDiscovery.h"
 #include "Paths.h"
+#include "ValueLines.h"
 
 namespace {
 
@@ -81,29 +82,22 @@ std::string JsonListing(const std::string& path, const std::string& palette,
     return book.dump(2, ' ', false, nlohmann::json::error_handler_t::replace) + "\n";
 }
 
-int RunBook(const BookArguments& arguments) {
-    try {
-        std::string path = arguments.file;
-        if (path.empty() && !Pigmo::FindDefaultPalettePath(path))
-            throw std::runtime_error("no system palette found; give a FILE or set PIGMO_INSTALL_LOCATION");
-        std::vector<Pigmo::ColorInformation> colors;
-        const char* error = nullptr;
-        if (!Pigmo::LoadColorBook(path.c_str(), colors, &error)) {
-            const std::string text = error != nullptr ? error : "cannot read the book";
-            // The "doesn't exist" text names the file already.
-            throw std::runtime_error(text.find(path) != std::string::npos ? text : path + ": " + text);
-        }
-        const std::string palette = Pigmo::PaletteDisplayName(path.c_str());
-        const std::string shown = Pigmo::Platform::NativePath(path);
-        const std::string listing =
-            arguments.json ? JsonListing(shown, palette, colors) : TextListing(shown, palette, colors);
-        if (std::fputs(listing.c_str(), stdout) < 0 || std::fflush(stdout) != 0)
-            throw std::runtime_error("cannot write the output");
-        return 0;
-    } catch (const std::exception& e) {
-        std::fprintf(stderr, "pigmo book: %s\n", e.what());
-        return 1;
+void RunBook(const BookArguments& arguments) {
+    std::string path = arguments.file;
+    if (path.empty() && !Pigmo::FindDefaultPalettePath(path))
+        throw std::runtime_error("no system palette found; give a FILE or set PIGMO_INSTALL_LOCATION");
+    std::vector<Pigmo::ColorInformation> colors;
+    const char* error = nullptr;
+    if (!Pigmo::LoadColorBook(path.c_str(), colors, &error)) {
+        const std::string text = error != nullptr ? error : "cannot read the book";
+        // The "doesn't exist" text names the file already.
+        throw std::runtime_error(text.find(path) != std::string::npos ? text : path + ": " + text);
     }
+    const std::string palette = Pigmo::PaletteDisplayName(path.c_str());
+    const std::string shown = Pigmo::Platform::NativePath(path);
+    const std::string listing =
+        arguments.json ? JsonListing(shown, palette, colors) : TextListing(shown, palette, colors);
+    if (std::fputs(listing.c_str(), stdout) < 0) throw std::runtime_error("cannot write the output");
 }
 
 }  // namespace
@@ -119,5 +113,6 @@ void AddBookCommand(CLI::App& app, int& exitCode) {
         "are derived: CIELAB from a 36-band curve or else from the book's sRGB, linear RGB from the book's "
         "sRGB or else from the curve; what cannot be derived is 0.\n"
         "Example: pigmo book \"ISCC-NBS Centroid Colors.cxf\"");
-    command->callback([arguments, &exitCode] { exitCode = RunBook(*arguments); });
+    command->callback(
+        [arguments, &exitCode] { exitCode = RunCommand("book", [&] { RunBook(*arguments); }); });
 }

@@ -93,14 +93,11 @@ private:
 };
 
 int RunDeltaE(const DeltaEArguments& arguments) {
-    try {
+    return RunCommand("delta-e", [&] {
         const PairPrinter printer(arguments);
-        return ForEachValueLine("delta-e", arguments.values,
-                                [&](const std::vector<std::string>& values) { printer.Print(values); });
-    } catch (const std::exception& e) {
-        std::fprintf(stderr, "pigmo delta-e: %s\n", e.what());
-        return 1;
-    }
+        ForEachValueLine(arguments.values,
+                         [&](const std::vector<std::string>& values) { printer.Print(values); });
+    });
 }
 
 }  // namespace

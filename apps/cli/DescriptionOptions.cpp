@@ -1,6 +1,6 @@
 #include "DescriptionOptions.h"
 
-#include <array>
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstdio>
@@ -8,7 +8,7 @@
 #include <sstream>
 #include <stdexcept>
 
-#include "ColorTranslator.h"
+#include "ColorSpaceSRGB.h"
 
 namespace {
 
@@ -45,22 +45,24 @@ constexpr NamedSpace kNamedSpaces[] = {
 constexpr int32_t kLastCode = 84;
 constexpr int32_t kSRGB = 24;
 constexpr int32_t kLinearSRGB = 25;
-constexpr int32_t kXYZ = 6;
 constexpr int32_t kDensity = 1;
 constexpr int32_t kSpectral = 2;
 
-// Comma-separated numbers of an option; flag is the option as typed, for messages.
+// ParseNumber for an option; flag is the option as typed, for messages.
+double ParseOptionNumber(const std::string& flag, const std::string& text) {
+    try {
+        return ParseNumber(text);
+    } catch (const std::invalid_argument& e) {
+        throw std::invalid_argument(flag + ": " + e.what());
+    }
+}
+
+// Comma-separated numbers of an option.
 std::vector<double> ParseList(const std::string& flag, const std::string& text) {
     std::vector<double> values;
     std::string item;
     std::istringstream stream(text);
-    while (std::getline(stream, item, ',')) {
-        try {
-            values.push_back(ParseNumber(item));
-        } catch (const std::invalid_argument& e) {
-            throw std::invalid_argument(flag + ": " + e.what());
-        }
-    }
+    while (std::getline(stream, item, ',')) values.push_back(ParseOptionNumber(flag, item));
     if (!text.empty() && text.back() == ',') throw std::invalid_argument(flag + ": empty value after ','");
     return values;
 }
@@ -84,12 +86,7 @@ void ApplyObserver(const std::string& flag, const std::string& text, ColorSpaceS
 }
 
 double ParsePositive(const std::string& flag, const std::string& text) {
-    double value = 0.0;
-    try {
-        value = ParseNumber(text);
-    } catch (const std::invalid_argument& e) {
-        throw std::invalid_argument(flag + ": " + e.what());
-    }
+    const double value = ParseOptionNumber(flag, text);
     if (!(value > 0.0)) throw std::invalid_argument(flag + ": must be positive, got '" + text + "'");
     return value;
 }
@@ -103,19 +100,11 @@ void ApplyField(const std::string& flag, const std::string& text, ColorSpaceStru
 }
 
 void ApplyStart(const std::string& flag, const std::string& text, ColorSpaceStruct& description) {
-    try {
-        description.wavelengthStart = ParseNumber(text);
-    } catch (const std::invalid_argument& e) {
-        throw std::invalid_argument(flag + ": " + e.what());
-    }
+    description.wavelengthStart = ParseOptionNumber(flag, text);
 }
 
 void ApplyEnd(const std::string& flag, const std::string& text, ColorSpaceStruct& description) {
-    try {
-        description.wavelengthEnd = ParseNumber(text);
-    } catch (const std::invalid_argument& e) {
-        throw std::invalid_argument(flag + ": " + e.what());
-    }
+    description.wavelengthEnd = ParseOptionNumber(flag, text);
 }
 
 void ApplyStep(const std::string& flag, const std::string& text, ColorSpaceStruct& description) {
@@ -146,6 +135,16 @@ constexpr NamedIlluminant kIlluminants[] = {
     {"f10", 16, 0.0},      {"f11", 17, 0.0},   {"f12", 18, 0.0},
 };
 
+// The white belongs to the observer the colors are seen with.
+void Illuminate(ColorSpaceStruct& description, int32_t kind, double temperature) {
+    description.illuminant = IlluminantStruct{};
+    description.illuminant.observer = description.observer;
+    description.illuminant.observerAge = description.observerAge;
+    description.illuminant.fieldSize = description.fieldSize;
+    description.illuminant.SetIlluminant(kind, temperature);
+    description.hasIlluminant = true;
+}
+
 std::string IlluminantNames() {
     std::string names = "none";
     for (const NamedIlluminant& il : kIlluminants) {
@@ -172,13 +171,7 @@ void ApplyIlluminant(const std::string& flag, const std::string& text, ColorSpac
         }
         const double temperature =
             byTemperature ? ParsePositive(flag, text.substr(colon + 1)) : il.temperature;
-        // The white belongs to the observer the colors are seen with.
-        description.illuminant = IlluminantStruct{};
-        description.illuminant.observer = description.observer;
-        description.illuminant.observerAge = description.observerAge;
-        description.illuminant.fieldSize = description.fieldSize;
-        description.illuminant.SetIlluminant(il.kind, temperature);
-        description.hasIlluminant = true;
+        Illuminate(description, il.kind, temperature);
         return;
     }
     throw std::invalid_argument(flag + ": unknown illuminant '" + text + "' (use " + IlluminantNames() + ")");
@@ -276,23 +269,6 @@ std::string AdaptationNames() {
     return names;
 }
 
-// The sRGB nodes work relative to the white of their primaries: XYZ of 255,255,255 scaled to Y = 1.
-const double* SRGBWhite() {
-    static const auto white = [] {
-        ColorSpaceStruct rgb, xyz;
-        rgb.SetType(kSRGB);
-        xyz.SetType(kXYZ);
-        cColorTranslator translator;
-        translator.SetSource(rgb);
-        translator.SetDestination(xyz);
-        const double full[3] = {255.0, 255.0, 255.0};
-        std::array<double, 3> w{};
-        translator.Translate(full, w.data());
-        return std::array<double, 3>{w[0] / w[1], 1.0, w[2] / w[1]};
-    }();
-    return white.data();
-}
-
 }  // namespace
 
 DescriptionOptions::DescriptionOptions() : given_(std::size(kOptions)) {}
@@ -333,7 +309,8 @@ ColorSpaceStruct DescriptionOptions::Describe(ConversionSide side, int32_t code)
     if (!description.SetType(code)) {
         throw std::invalid_argument(DescribeColorSpace(code) + " needs an extended description");
     }
-    if (code == kSRGB || code == kLinearSRGB) std::copy(SRGBWhite(), SRGBWhite() + 3, description.whitePoint);
+    // The sRGB nodes work relative to the white of their primaries.
+    if (code == kSRGB || code == kLinearSRGB) cColorSpaceSRGB::White(description.whitePoint);
     if (code == kSpectral) {
         // The grid of the color books.
         description.wavelengthStart = 380.0;
@@ -350,13 +327,7 @@ ColorSpaceStruct DescriptionOptions::Describe(ConversionSide side, int32_t code)
         }
     }
     if (code == kSpectral) {
-        if (!Gives(side, "illuminant")) {
-            description.illuminant.observer = description.observer;
-            description.illuminant.observerAge = description.observerAge;
-            description.illuminant.fieldSize = description.fieldSize;
-            description.illuminant.SetIlluminant(1, 5003.0);
-            description.hasIlluminant = true;
-        }
+        if (!Gives(side, "illuminant")) Illuminate(description, 1, 5003.0);
         if (!(description.wavelengthEnd > description.wavelengthStart)) {
             char text[128];
             std::snprintf(text, sizeof text, "%send (%g nm) must lie above %sstart (%g nm)", prefix,
@@ -422,6 +393,12 @@ std::string ColorSpaceNames() {
         names += std::string(space.name) + " (" + std::to_string(space.code) + ")";
     }
     return names;
+}
+
+void ParseLab(const std::vector<std::string>& values, double* lab) {
+    if (values.size() != 3)
+        throw std::invalid_argument("expected 3 values (L a b), got " + std::to_string(values.size()));
+    for (int i = 0; i < 3; ++i) lab[i] = ParseNumber(values[i]);
 }
 
 double ParseNumber(const std::string& text) {

@@ -54,3 +54,6 @@ std::string ColorSpaceNames();
 
 // Strict number: the whole text is one finite decimal number. Throws std::invalid_argument.
 double ParseNumber(const std::string& text);
+
+// L*, a*, b* of one color from exactly three strict numbers. Throws std::invalid_argument.
+void ParseLab(const std::vector<std::string>& values, double* lab);

@@ -12,6 +12,7 @@
 #include <vector>
 
 #include "Commands.h"
+#include "ValueLines.h"
 #include "pigmo/bp.h"
 
 namespace {
@@ -115,22 +116,14 @@ void PrintText(const std::vector<DominantColor>& colors) {
     }
 }
 
-int RunExtract(const ExtractArguments& arguments) {
-    try {
-        const int count = ParseCount(arguments.count);
-        DecodedImage image = Load(arguments.image);
-        const std::vector<DominantColor> colors = Dominant(image, count);
-        if (arguments.json) {
-            PrintJson(arguments, image, colors);
-        } else {
-            PrintText(colors);
-        }
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
-    } catch (const std::exception& e) {
-        std::fflush(stdout);
-        std::fprintf(stderr, "pigmo extract: %s\n", e.what());
-        return 1;
+void RunExtract(const ExtractArguments& arguments) {
+    const int count = ParseCount(arguments.count);
+    DecodedImage image = Load(arguments.image);
+    const std::vector<DominantColor> colors = Dominant(image, count);
+    if (arguments.json) {
+        PrintJson(arguments, image, colors);
+    } else {
+        PrintText(colors);
     }
 }
 
@@ -151,5 +144,6 @@ void AddExtractCommand(CLI::App& app, int& exitCode) {
         " name of its nearest centroid. Fewer colors come out when fewer groups stand apart. Transparency is"
         " ignored.\n"
         "Example: pigmo extract photo.jpg -n 5");
-    command->callback([arguments, &exitCode] { exitCode = RunExtract(*arguments); });
+    command->callback(
+        [arguments, &exitCode] { exitCode = RunCommand("extract", [&] { RunExtract(*arguments); }); });
 }

@@ -7,6 +7,7 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "ValueLines.h"
 #include "pigmo/bp.h"
 
 namespace {
@@ -25,37 +26,25 @@ const std::map<std::string, PairHarmony> kPairHarmonies = {
     {"triadic", BPHarmonyGetTriadic},
 };
 
-int RunHarmony(const HarmonyArguments& arguments) {
-    try {
-        if (arguments.lab.size() != 3) {
-            throw std::invalid_argument("expected 3 values (L a b), got " +
-                                        std::to_string(arguments.lab.size()));
+void RunHarmony(const HarmonyArguments& arguments) {
+    double lab[3];
+    ParseLab(arguments.lab, lab);
+    double out[2][3];
+    int count = 1;
+    int status = 0;
+    if (arguments.kind == "complement") {
+        status = BPHarmonyGetComplement(lab, out[0]);
+    } else {
+        const auto found = kPairHarmonies.find(arguments.kind);
+        if (found == kPairHarmonies.end()) {
+            throw std::invalid_argument("unknown harmony '" + arguments.kind +
+                                        "' (one of monochromatic, near, far, triadic, complement)");
         }
-        const double lab[3] = {ParseNumber(arguments.lab[0]), ParseNumber(arguments.lab[1]),
-                               ParseNumber(arguments.lab[2])};
-        double out[2][3];
-        int count = 1;
-        int status = 0;
-        if (arguments.kind == "complement") {
-            status = BPHarmonyGetComplement(lab, out[0]);
-        } else {
-            const auto found = kPairHarmonies.find(arguments.kind);
-            if (found == kPairHarmonies.end()) {
-                throw std::invalid_argument("unknown harmony '" + arguments.kind +
-                                            "' (one of monochromatic, near, far, triadic, complement)");
-            }
-            status = found->second(lab, out[0], out[1]);
-            count = 2;
-        }
-        if (status != 1) throw std::runtime_error("the color could not be converted");
-        for (int i = 0; i < count; ++i) std::printf("%.10g %.10g %.10g\n", out[i][0], out[i][1], out[i][2]);
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
-    } catch (const std::exception& e) {
-        std::fflush(stdout);
-        std::fprintf(stderr, "pigmo harmony: %s\n", e.what());
-        return 1;
+        status = found->second(lab, out[0], out[1]);
+        count = 2;
     }
+    if (status != 1) throw std::runtime_error("the color could not be converted");
+    for (int i = 0; i < count; ++i) std::printf("%.10g %.10g %.10g\n", out[i][0], out[i][1], out[i][2]);
 }
 
 }  // namespace
@@ -71,5 +60,6 @@ void AddHarmonyCommand(CLI::App& app, int& exitCode) {
         "both ways, printed minus first), complement by 180; monochromatic changes lightness only. Each"
         " companion is printed as L a b on one line.\n"
         "Example: pigmo harmony complement 60 30 20");
-    command->callback([arguments, &exitCode] { exitCode = RunHarmony(*arguments); });
+    command->callback(
+        [arguments, &exitCode] { exitCode = RunCommand("harmony", [&] { RunHarmony(*arguments); }); });
 }

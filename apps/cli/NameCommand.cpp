@@ -6,30 +6,20 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "ValueLines.h"
 #include "pigmo/bp.h"
 
 namespace {
 
-int RunName(const std::vector<std::string>& arguments) {
-    try {
-        if (arguments.size() != 3) {
-            throw std::invalid_argument("expected 3 values (L a b), got " + std::to_string(arguments.size()));
-        }
-        const double lab[3] = {ParseNumber(arguments[0]), ParseNumber(arguments[1]),
-                               ParseNumber(arguments[2])};
-        const int index = BPCentroidGetForLab(lab);
-        if (index < 1) throw std::runtime_error("no centroid found for this color");
-        const int category = BPCentroidGetCategory(index);
-        std::printf("index: %d\nname: %s\ncategory: %d %s\ndistance: %.4f\n", index, BPCentroidGetName(index),
-                    category, BPCentroidGetCategoryName(category),
-                    BPCalculateDeltaE(lab, BPCentroidGetLab(index)));
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
-    } catch (const std::exception& e) {
-        std::fflush(stdout);
-        std::fprintf(stderr, "pigmo name: %s\n", e.what());
-        return 1;
-    }
+void RunName(const std::vector<std::string>& arguments) {
+    double lab[3];
+    ParseLab(arguments, lab);
+    const int index = BPCentroidGetForLab(lab);
+    if (index < 1) throw std::runtime_error("no centroid found for this color");
+    const int category = BPCentroidGetCategory(index);
+    std::printf("index: %d\nname: %s\ncategory: %d %s\ndistance: %.4f\n", index, BPCentroidGetName(index),
+                category, BPCentroidGetCategoryName(category),
+                BPCalculateDeltaE(lab, BPCentroidGetLab(index)));
 }
 
 }  // namespace
@@ -43,5 +33,6 @@ void AddNameCommand(CLI::App& app, int& exitCode) {
         " distance. The search looks among the centroids of the color's L* = 50, a* = 0, b* = 0 octant and"
         " those lying near its borders.\n"
         "Example: pigmo name 50 -20 10");
-    command->callback([arguments, &exitCode] { exitCode = RunName(*arguments); });
+    command->callback(
+        [arguments, &exitCode] { exitCode = RunCommand("name", [&] { RunName(*arguments); }); });
 }

@@ -93,14 +93,11 @@ private:
 };
 
 int RunTranslate(const TranslateArguments& arguments) {
-    try {
+    return RunCommand("translate", [&] {
         ColorLineConverter converter(arguments);
-        return ForEachValueLine("translate", arguments.values,
-                                [&](const std::vector<std::string>& values) { converter.Convert(values); });
-    } catch (const std::exception& e) {
-        std::fprintf(stderr, "pigmo translate: %s\n", e.what());
-        return 1;
-    }
+        ForEachValueLine(arguments.values,
+                         [&](const std::vector<std::string>& values) { converter.Convert(values); });
+    });
 }
 
 }  // namespace

@@ -18,28 +18,32 @@ std::vector<std::string> SplitLine(const std::string& line) {
     return values;
 }
 
-int ForEachValueLine(const std::string& command, const std::vector<std::string>& values,
-                     const std::function<void(const std::vector<std::string>&)>& handle) {
+int RunCommand(const std::string& command, const std::function<void()>& work) {
     try {
-        if (!values.empty()) {
-            handle(values);
-        } else {
-            std::string line;
-            for (int number = 1; std::getline(std::cin, line); ++number) {
-                const std::vector<std::string> lineValues = SplitLine(line);
-                if (lineValues.empty()) continue;
-                try {
-                    handle(lineValues);
-                } catch (const std::exception& e) {
-                    throw std::runtime_error("line " + std::to_string(number) + ": " + e.what());
-                }
-            }
-        }
+        work();
         if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
         return 0;
     } catch (const std::exception& e) {
         std::fflush(stdout);
         std::fprintf(stderr, "pigmo %s: %s\n", command.c_str(), e.what());
         return 1;
+    }
+}
+
+void ForEachValueLine(const std::vector<std::string>& values,
+                      const std::function<void(const std::vector<std::string>&)>& handle) {
+    if (!values.empty()) {
+        handle(values);
+        return;
+    }
+    std::string line;
+    for (int number = 1; std::getline(std::cin, line); ++number) {
+        const std::vector<std::string> lineValues = SplitLine(line);
+        if (lineValues.empty()) continue;
+        try {
+            handle(lineValues);
+        } catch (const std::exception& e) {
+            throw std::runtime_error("line " + std::to_string(number) + ": " + e.what());
+        }
     }
 }

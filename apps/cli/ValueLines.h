@@ -7,8 +7,11 @@
 // Values of one input line, separated by blanks or commas.
 std::vector<std::string> SplitLine(const std::string& line);
 
+// Runs the work of "pigmo COMMAND". An exception, or output that cannot be written, prints
+// "pigmo COMMAND: ..." as one line on stderr after what was already printed, and gives exit code 1.
+int RunCommand(const std::string& command, const std::function<void()>& work);
+
 // Runs handle on the values given on the command line or, when there are none, on each non-blank
-// line of standard input. Any error prints "pigmo COMMAND: ..." (with the line number for standard
-// input) as one line on stderr after what was already printed, and gives exit code 1.
-int ForEachValueLine(const std::string& command, const std::vector<std::string>& values,
-                     const std::function<void(const std::vector<std::string>&)>& handle);
+// line of standard input; an error on a line of standard input is rethrown with its line number.
+void ForEachValueLine(const std::vector<std::string>& values,
+                      const std::function<void(const std::vector<std::string>&)>& handle);

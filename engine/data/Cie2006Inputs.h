@@ -17,6 +17,10 @@ struct Cie2006Row {
 
 extern const Cie2006Row kCie2006Inputs[kCie2006Count];
 
-// XYZ from cone fundamentals goes through the inverse of this LMS-from-XYZ matrix.
-inline constexpr double kCie2006LmsFromXyz[3][3] = {
-    {0.38971, 0.68898, -0.07868}, {-0.22981, 1.18340, 0.04641}, {0.0, 0.0, 1.0}};
+// XYZ from cone fundamentals goes through the inverse of this LMS-from-XYZ matrix (row-major).
+// clang-format off
+inline constexpr double kCie2006LmsFromXyz[9] = {
+    0.38971, 0.68898, -0.07868,
+    -0.22981, 1.18340, 0.04641,
+    0.0, 0.0, 1.0};
+// clang-format on

@@ -2,6 +2,8 @@
 
 #include <cmath>
 
+#include "Matrix3.h"
+
 namespace {
 
 constexpr double kDegreesPerRadian = 57.29577951308232;
@@ -15,15 +17,6 @@ constexpr double kCat02ToHpe[9] = {0.740979,  0.218025,  0.0410058, 0.285353, 0.
                                    0.0904454, -0.009628, -0.005698, 1.01533};
 constexpr double kHpeToCat02[9] = {1.55915,   -0.544722, -0.0144452, -0.714327, 1.85031,
                                    -0.135977, 0.0107761, 0.0052185,  0.984005};
-
-void Multiply(const double* m, const double* v, double* out) {
-    const double x = v[0];
-    const double y = v[1];
-    const double z = v[2];
-    out[0] = m[0] * x + m[1] * y + m[2] * z;
-    out[1] = m[3] * x + m[4] * y + m[5] * z;
-    out[2] = m[6] * x + m[7] * y + m[8] * z;
-}
 
 double Compress(double fl, double v) {
     if (!(v < 0.0)) {
@@ -64,7 +57,7 @@ cColorSpaceCIECAM02::cColorSpaceCIECAM02(const ColorSpaceStruct& description)
     d_ = f * (1.0 - 0.2777777777777778 * std::exp((-42.0 - la) / 92.0));
 
     double rgbW[3];
-    Multiply(kCat02, white, rgbW);
+    Multiply3(kCat02, white, rgbW);
     for (int i = 0; i < 3; ++i) adapt_[i] = (white[1] / rgbW[i]) * d_ + 1.0 - d_;
     fl4_ = std::pow(fl_, 0.25);
     chromaScale_ = std::pow(1.64 - std::pow(0.29, n), 0.73);
@@ -109,7 +102,7 @@ std::unique_ptr<cColorSpaceCIECAM02> cColorSpaceCIECAM02::Create(const ColorSpac
 void cColorSpaceCIECAM02::CompressedResponses(const double* rgb, double* compressed) const {
     const double adapted[3] = {rgb[0] * adapt_[0], rgb[1] * adapt_[1], rgb[2] * adapt_[2]};
     double hpe[3];
-    Multiply(kCat02ToHpe, adapted, hpe);
+    Multiply3(kCat02ToHpe, adapted, hpe);
     for (int i = 0; i < 3; ++i) compressed[i] = Compress(fl_, hpe[i]);
 }
 
@@ -126,7 +119,7 @@ cColorSpaceCIECAM02::Correlates cColorSpaceCIECAM02::Forward(const double* xyz) 
         if (sample[i] <= 0.0) sample[i] = 0.0;
     }
     double rgb[3];
-    Multiply(kCat02, sample, rgb);
+    Multiply3(kCat02, sample, rgb);
     double p[3];
     CompressedResponses(rgb, p);
 
@@ -178,9 +171,9 @@ void cColorSpaceCIECAM02::Inverse(double J, double C, double h, double* xyz) con
     const double hpe[3] = {Expand(fl_, compressed[0]), Expand(fl_, compressed[1]),
                            Expand(fl_, compressed[2])};
     double rgb[3];
-    Multiply(kHpeToCat02, hpe, rgb);
+    Multiply3(kHpeToCat02, hpe, rgb);
     for (int i = 0; i < 3; ++i) rgb[i] /= adapt_[i];
-    Multiply(kCat02Inverse, rgb, xyz);
+    Multiply3(kCat02Inverse, rgb, xyz);
     if (!absolute_) {
         for (int i = 0; i < 3; ++i) xyz[i] *= 0.01;
     }

@@ -2,12 +2,6 @@
 
 #include <cmath>
 
-namespace {
-double DecodeSRGB(double c) {
-    return c > 0.04045 ? std::pow((c + 0.055) / 1.055, 2.4) : c / 12.92;
-}
-}  // namespace
-
 // Four-decimal coefficients, as stored colors were computed with them.
 void cColorSpaceSRGB::LinearToXYZ(const double* rgb, double* xyz) {
     const double r = rgb[0];
@@ -27,11 +21,24 @@ void cColorSpaceSRGB::XYZToLinear(const double* xyz, double* rgb) {
     rgb[2] = 0.0557 * x - 0.204 * y + 1.057 * z;
 }
 
+double cColorSpaceSRGB::DecodeSRGB(double c) {
+    return c > 0.04045 ? std::pow((c + 0.055) / 1.055, 2.4) : c / 12.92;
+}
+
 double cColorSpaceSRGB::EncodeSRGB(double v) {
     if (v < 0.0) return 0.0;
     if (v > 1.0) return 1.0;
     if (v <= 0.0031308) return 12.92 * v;
     return 1.055 * std::pow(v, 0.4166666666666667) - 0.055;
+}
+
+void cColorSpaceSRGB::White(double* white) {
+    const double full[3] = {255.0, 255.0, 255.0};
+    double xyz[3];
+    cColorSpaceSRGB().ToXYZ(full, xyz);
+    white[0] = xyz[0] / xyz[1];
+    white[1] = 1.0;
+    white[2] = xyz[2] / xyz[1];
 }
 
 void cColorSpaceSRGB::ToXYZ(const double* in, double* out) {

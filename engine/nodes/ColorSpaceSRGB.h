@@ -8,8 +8,12 @@ public:
     void ToXYZ(const double* in, double* out) override;
     void FromXYZ(const double* in, double* out) override;
 
+    // Linear value of one gamma-encoded value on 0..1.
+    static double DecodeSRGB(double c);
     // Gamma-encodes one linear value, clamped to 0..1.
     static double EncodeSRGB(double v);
+    // The white the node reaches: XYZ of 255, 255, 255 normalised to Y = 1.
+    static void White(double* white);
     // The primaries' matrices on linear values 0..1, shared with the linear node.
     static void LinearToXYZ(const double* rgb, double* xyz);
     static void XYZToLinear(const double* xyz, double* rgb);

@@ -84,13 +84,15 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
 
     sameGrid_ = destination.wavelengthStart == start_ && destination.wavelengthEnd == end_ &&
                 destination.wavelengthStep == sourceStep_;
+    sourceGrid_ = EvenGrid(start_, sourceStep_, sourceBandCount_);
     if (!sameGrid_) {
-        sourceGrid_ = EvenGrid(start_, sourceStep_, sourceBandCount_);
         destinationGrid_ =
             EvenGrid(destination.wavelengthStart, destination.wavelengthStep,
                      ColorSpaceStruct::BandCount(destination.wavelengthStart, destination.wavelengthEnd,
                                                  destination.wavelengthStep));
     }
+    // Scratch for the monotone cubic, shared by every resampling between these grids.
+    derivatives_.resize(std::max(sourceGrid_.size(), destinationGrid_.size()));
 
     if (emissive_) {
         illuminant_.SetIlluminant(6, 0.0);
@@ -102,16 +104,12 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     // A reversed, empty or degenerate grid leaves the node inert.
     if (end_ == start_ || !(sourceStep_ > 0.0) || sourceBandCount_ <= 0) {
         workingBandCount_ = 0;
-        derivatives_.resize(std::max(sourceGrid_.size(), destinationGrid_.size()));
         return;
     }
     workingBandCount_ = ColorSpaceStruct::BandCount(start_, end_, workingStep_);
 
     if (mode_ == SpectralIntegration::FixedTable) {
-        if (TryFixedTable(source)) {
-            derivatives_.resize(std::max(sourceGrid_.size(), destinationGrid_.size()));
-            return;
-        }
+        if (TryFixedTable(source)) return;
         // Without a matching set the weights are computed, by Sprague where its kernel applies.
         mode_ = kernelStep && sourceBandCount_ >= 6 ? SpectralIntegration::Sprague
                                                     : SpectralIntegration::OneNanometre;
@@ -150,11 +148,9 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     scale_[2] = sums[2] != 0.0 ? illuminant_.relativeWhite[2] / sums[2] : 0.0;
 
     if (mode_ == SpectralIntegration::OneNanometre) {
-        sourceWavelengths_ = EvenGrid(start_, sourceStep_, sourceBandCount_);
         workingWavelengths_ = EvenGrid(start_, workingStep_, workingBandCount_);
         resampled_.resize(workingBandCount_);
     }
-    derivatives_.resize(std::max({sourceGrid_.size(), destinationGrid_.size(), sourceWavelengths_.size()}));
 }
 
 bool cColorSpaceSpectral::TryFixedTable(const ColorSpaceStruct& source) {
@@ -291,7 +287,7 @@ void cColorSpaceSpectral::ToXYZ(const double* in, double* out) {
     if (workingBandCount_ == 0) return;
     const double* values = in;
     if (mode_ == SpectralIntegration::OneNanometre) {
-        Resample(sourceWavelengths_, workingWavelengths_, in, resampled_.data());
+        Resample(sourceGrid_, workingWavelengths_, in, resampled_.data());
         values = resampled_.data();
     }
     for (int c = 0; c < 3; ++c) {

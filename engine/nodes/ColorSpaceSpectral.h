@@ -61,7 +61,6 @@ private:
     double workingStep_ = 0.0;
     WeightVector weights_[3];            // X, Y, Z
     double scale_[3] = {0.0, 0.0, 0.0};  // X, Y, Z
-    std::vector<double> sourceWavelengths_;
     std::vector<double> workingWavelengths_;
     std::vector<double> derivatives_;
     std::vector<double> resampled_;

@@ -42,17 +42,9 @@ void SetPlanckian(IlluminantStruct& r, double temperature) {
     SetTable(r, kGeneratedStart, kGeneratedStep, values.data(), count);
 }
 
-// Other daylight temperatures: the nearer of the D50 and D65 tables, tilted by the ratio of the
-// peak-normalised Planck curves of the wanted and the table's temperature.
+// Daylight: the nearer of the D50 and D65 tables, at any other temperature tilted by the ratio of
+// the peak-normalised Planck curves of the wanted and the table's temperature.
 void SetDaylight(IlluminantStruct& r, double temperature) {
-    if (temperature == kD50Temperature) {
-        SetTable(r, kIlluminantD50Start, kIlluminantD50Step, kIlluminantD50, kIlluminantD50Count);
-        return;
-    }
-    if (temperature == kD65Temperature) {
-        SetTable(r, kIlluminantD65Start, kIlluminantD65Step, kIlluminantD65, kIlluminantD65Count);
-        return;
-    }
     const bool fromD65 = temperature >= kDaylightSplit;
     const double base = fromD65 ? kD65Temperature : kD50Temperature;
     if (fromD65) {
@@ -60,6 +52,7 @@ void SetDaylight(IlluminantStruct& r, double temperature) {
     } else {
         SetTable(r, kIlluminantD50Start, kIlluminantD50Step, kIlluminantD50, kIlluminantD50Count);
     }
+    if (temperature == base) return;
     const int32_t n = static_cast<int32_t>(r.values.size());
     std::vector<double> wanted(n), table(n);
     double wantedPeak = 0.0, tablePeak = 0.0;

@@ -6,23 +6,9 @@
 #include "Cie2006Inputs.h"
 #include "CieObservers.h"
 #include "Interpolation.h"
+#include "Matrix3.h"
 
 namespace {
-
-void Invert3x3(const double m[3][3], double out[3][3]) {
-    const double det = m[0][0] * (m[1][1] * m[2][2] - m[1][2] * m[2][1]) -
-                       m[0][1] * (m[1][0] * m[2][2] - m[1][2] * m[2][0]) +
-                       m[0][2] * (m[1][0] * m[2][1] - m[1][1] * m[2][0]);
-    out[0][0] = (m[1][1] * m[2][2] - m[1][2] * m[2][1]) / det;
-    out[0][1] = (m[0][2] * m[2][1] - m[0][1] * m[2][2]) / det;
-    out[0][2] = (m[0][1] * m[1][2] - m[0][2] * m[1][1]) / det;
-    out[1][0] = (m[1][2] * m[2][0] - m[1][0] * m[2][2]) / det;
-    out[1][1] = (m[0][0] * m[2][2] - m[0][2] * m[2][0]) / det;
-    out[1][2] = (m[0][2] * m[1][0] - m[0][0] * m[1][2]) / det;
-    out[2][0] = (m[1][0] * m[2][1] - m[1][1] * m[2][0]) / det;
-    out[2][1] = (m[0][1] * m[2][0] - m[0][0] * m[2][1]) / det;
-    out[2][2] = (m[0][0] * m[1][1] - m[0][1] * m[1][0]) / det;
-}
 
 // Samples a table at the target grid by linear interpolation; negatives become 0.
 SampledFunction SampleTable(const double* wavelengths, const double* table, int32_t n, double start,
@@ -78,14 +64,14 @@ std::vector<double> Cie2006ColorMatchingFunctions(double age, double fieldSize) 
         }
     }
     // Equal areas make the equal-energy white come out equal in X, Y and Z through the matrix.
-    double xyzFromLms[3][3];
-    Invert3x3(kCie2006LmsFromXyz, xyzFromLms);
+    double xyzFromLms[9];
+    Invert3(kCie2006LmsFromXyz, xyzFromLms);
     std::vector<double> xyz(lms.size());
     double yPeak = 0.0;
     for (int32_t i = 0; i < kCie2006Count; ++i) {
         for (int k = 0; k < 3; ++k) {
             double sum = 0.0;
-            for (int c = 0; c < 3; ++c) sum += xyzFromLms[k][c] * lms[i * 3 + c] / area[c];
+            for (int c = 0; c < 3; ++c) sum += xyzFromLms[3 * k + c] * lms[i * 3 + c] / area[c];
             xyz[i * 3 + k] = sum;
         }
         yPeak = std::max(yPeak, xyz[i * 3 + 1]);
