@@ -24,22 +24,11 @@ EngineSetup Plain() {
     return {Described(SourceCode), Described(DestinationCode)};
 }
 
-// The color books' grid: 36 bands, 380 to 730 nm by 10 nm, under the given light.
-ColorSpaceStruct BookSpectrum(int32_t illuminantKind, double temperature) {
-    ColorSpaceStruct description = Described(2);
-    description.wavelengthStart = 380.0;
-    description.wavelengthEnd = 730.0;
-    description.wavelengthStep = 10.0;
-    description.illuminant.SetIlluminant(illuminantKind, temperature);
-    description.hasIlluminant = true;
-    return description;
-}
-
 EngineSetup SpectralToLabD50() {
     ColorSpaceStruct lab = Described(3);
     lab.illuminant.SetIlluminant(1, 5003.0);
     lab.hasIlluminant = true;
-    return {BookSpectrum(1, 5003.0), lab};
+    return {ColorSpaceStruct::BookSpectrum(1, 5003.0), lab};
 }
 
 // Linear sRGB on 0..1 at the white the sRGB node itself reaches.
@@ -51,7 +40,7 @@ ColorSpaceStruct LinearSRGBAtSRGBWhite() {
 }
 
 EngineSetup SpectralToLinearSRGB() {
-    return {BookSpectrum(2, 6500.0), LinearSRGBAtSRGBWhite(), 1};
+    return {ColorSpaceStruct::BookSpectrum(2, 6500.0), LinearSRGBAtSRGBWhite(), 1};
 }
 
 // Engines keep scratch buffers, so each thread translates on its own engine, built on its first call.

@@ -19,14 +19,8 @@ constexpr int kBands = 36;
 constexpr size_t kColors = 4096;
 
 ColorSpaceStruct Books(int weighting) {
-    ColorSpaceStruct d;
-    d.SetType(2);
-    d.wavelengthStart = 380;
-    d.wavelengthEnd = 730;
-    d.wavelengthStep = 10;
+    ColorSpaceStruct d = ColorSpaceStruct::BookSpectrum(1, 5003);
     d.weighting = weighting;
-    d.hasIlluminant = true;
-    d.illuminant.SetIlluminant(1, 5003);
     return d;
 }
 

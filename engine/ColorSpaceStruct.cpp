@@ -68,6 +68,17 @@ int32_t ColorSpaceStruct::BandCount(double start, double end, double step) {
     return static_cast<int32_t>(bands) + 1;
 }
 
+ColorSpaceStruct ColorSpaceStruct::BookSpectrum(int32_t illuminantKind, double temperature) {
+    ColorSpaceStruct description;
+    description.SetType(2);
+    description.wavelengthStart = 380.0;
+    description.wavelengthEnd = 730.0;
+    description.wavelengthStep = 10.0;
+    description.illuminant.SetIlluminant(illuminantKind, temperature);
+    description.hasIlluminant = true;
+    return description;
+}
+
 int32_t ColorSpaceStruct::ChannelCountOf(int32_t code) {
     if (code >= 48 && code <= 64) return kMultiChannelA[code - 48];
     if (code >= 65 && code <= 83) return kMultiChannelB[code - 65];

@@ -69,4 +69,6 @@ public:
     static bool SameWhite(const ColorSpaceStruct& a, const ColorSpaceStruct& b);
     // Band count of an evenly spaced grid: trunc((end - start) / step + 0.5) + 1.
     static int32_t BandCount(double start, double end, double step);
+    // The color books' spectra: 36 bands, 380 to 730 nm by 10 nm, under the given illuminant.
+    static ColorSpaceStruct BookSpectrum(int32_t illuminantKind, double temperature);
 };

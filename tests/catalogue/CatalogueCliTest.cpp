@@ -12,18 +12,13 @@
 #include <vector>
 
 #include "RunPigmo.h"
+#include "TempFolder.h"
 #include "pigmo/bp.h"
 
 namespace {
 
-class PigmoCli : public testing::Test {
+class PigmoCli : public TempFolder {
 protected:
-    void SetUp() override {
-        char pattern[] = "/tmp/pigmo-catalogue-cli-XXXXXX";
-        dir_ = mkdtemp(pattern);
-    }
-    void TearDown() override { std::filesystem::remove_all(dir_); }
-
     // An RGB PNG whose left three quarters are one color and the rest another.
     std::string WritePng(const unsigned char* left, const unsigned char* right) const {
         const int width = 8, height = 8;
@@ -34,12 +29,10 @@ protected:
                 rgb.insert(rgb.end(), color, color + 3);
             }
         }
-        const std::string path = (dir_ / "image.png").string();
+        const std::string path = root_ + "/image.png";
         EXPECT_NE(stbi_write_png(path.c_str(), width, height, 3, rgb.data(), width * 3), 0);
         return path;
     }
-
-    std::filesystem::path dir_;
 };
 
 std::string NameOf(const unsigned char* rgb) {
@@ -79,17 +72,17 @@ TEST_F(PigmoCli, ExtractListsDominantColorsLargestFirst) {
 }
 
 TEST_F(PigmoCli, ErrorsAreOneLineOnStandardError) {
-    std::ofstream(dir_ / "notes.txt") << "not an image\n";
+    Write("notes.txt", "not an image\n");
     const std::string cases[][2] = {
         {"name 50 1", "expected 3 values"},
         {"name 1 2 3 4", "expected 3 values"},
         {"name 50 abc 0", "'abc' is not a number"},
         {"name", "LAB is required"},
         {"extract", "IMAGE is required"},
-        {"extract " + (dir_ / "missing.png").string(), "No such file or directory"},
-        {"extract " + (dir_ / "notes.txt").string(), "cannot decode image"},
-        {"extract " + (dir_ / "notes.txt").string() + " -n 0", "not a whole number from 1 to 267"},
-        {"extract " + (dir_ / "notes.txt").string() + " -n many", "not a whole number from 1 to 267"},
+        {"extract " + root_ + "/missing.png", "No such file or directory"},
+        {"extract " + root_ + "/notes.txt", "cannot decode image"},
+        {"extract " + root_ + "/notes.txt" + " -n 0", "not a whole number from 1 to 267"},
+        {"extract " + root_ + "/notes.txt" + " -n many", "not a whole number from 1 to 267"},
     };
     for (const auto& [args, message] : cases) {
         const RunResult run = RunPigmo(args);

@@ -11,6 +11,7 @@
 #include "Registry.h"
 #include "ShellFolder.h"
 #include "StringTable.h"
+#include "TempFolder.h"
 
 namespace fs = std::filesystem;
 using Pigmo::Platform::RegistryStore;
@@ -40,19 +41,6 @@ INSTANTIATE_TEST_SUITE_P(
                     WildcardCase{"**", "", true}, WildcardCase{"", "a", false},
                     WildcardCase{"*a", "bbb", false}));
 
-class TempFolder : public testing::Test {
-protected:
-    void SetUp() override {
-        char name[] = "/tmp/pigmo-platform-XXXXXX";
-        ASSERT_NE(mkdtemp(name), nullptr);
-        root_ = name;
-    }
-    void TearDown() override { fs::remove_all(root_); }
-    void Touch(const std::string& name) { std::ofstream(root_ + "/" + name) << "x"; }
-
-    std::string root_;
-};
-
 std::vector<std::string> Search(const std::string& pattern) {
     std::vector<std::string> names;
     WIN32_FIND_DATAA found{};
@@ -68,7 +56,7 @@ std::vector<std::string> Search(const std::string& pattern) {
 using FileSearch = TempFolder;
 
 TEST_F(FileSearch, ListsMatchesInNameOrderWithEitherSeparator) {
-    for (const char* name : {"b.cxf", "A.CXF", "notes.txt", "z.Cxf", "c.cxf.old"}) Touch(name);
+    for (const char* name : {"b.cxf", "A.CXF", "notes.txt", "z.Cxf", "c.cxf.old"}) Write(name, "x");
     fs::create_directory(root_ + "/d.cxf");
     const std::vector<std::string> expected = {"A.CXF", "b.cxf", "d.cxf", "z.Cxf"};
     EXPECT_EQ(Search(root_ + "/*.cxf"), expected);

@@ -10,14 +10,7 @@
 namespace {
 
 ColorSpaceStruct Books(int kind = 1, double temperature = 5003) {
-    ColorSpaceStruct d;
-    d.SetType(2);
-    d.wavelengthStart = 380;
-    d.wavelengthEnd = 730;
-    d.wavelengthStep = 10;
-    d.hasIlluminant = true;
-    d.illuminant.SetIlluminant(kind, temperature);
-    return d;
+    return ColorSpaceStruct::BookSpectrum(kind, temperature);
 }
 
 ColorSpaceStruct Of(int type, const ColorSpaceStruct& white) {
