@@ -29,7 +29,7 @@ bool FindFirstSystemPalette(std::string& folder, WIN32_FIND_DATAA& found, HANDLE
     if (RegOpenKeyA(HKEY_LOCAL_MACHINE, Platform::kSuiteUninstallKeyWow64, &key) != ERROR_SUCCESS &&
         RegOpenKeyA(HKEY_LOCAL_MACHINE, Platform::kSuiteUninstallKey, &key) != ERROR_SUCCESS)
         return false;
-    char location[512] = {};
+    char location[Platform::kInstallLocationCapacity] = {};
     DWORD size = sizeof location;
     DWORD type = REG_SZ;
     if (RegQueryValueExA(key, "InstallLocation", nullptr, &type, reinterpret_cast<LPBYTE>(location), &size) !=

@@ -1,7 +1,9 @@
 #include "Registry.h"
 
 #include <dlfcn.h>
-#include <sys/stat.h>
+#include <limits.h>
+#include <link.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cctype>
@@ -15,9 +17,27 @@ std::string Folded(std::string text) {
     return text;
 }
 
-bool IsFolder(const std::string& path) {
-    struct stat status {};
-    return stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
+std::string RealPath(const std::string& path) {
+    char* resolved = path.empty() ? nullptr : realpath(path.c_str(), nullptr);
+    if (resolved == nullptr) return {};
+    std::string result = resolved;
+    std::free(resolved);
+    return result;
+}
+
+// The file this code was loaded from: the shared library that holds it, or else the program.
+std::string ModuleFile() {
+    Dl_info info{};
+    link_map* map = nullptr;
+    if (dladdr1(reinterpret_cast<void*>(&ModuleFile), &info, reinterpret_cast<void**>(&map),
+                RTLD_DL_LINKMAP) != 0 &&
+        map != nullptr && map->l_name != nullptr && map->l_name[0] != 0)
+        return map->l_name;
+    // The program's own entry has no name, and dladdr's stand-in for it is argv[0], which anyone can fake.
+    char path[PATH_MAX];
+    const ssize_t length = readlink("/proc/self/exe", path, sizeof path);
+    return length > 0 && static_cast<std::size_t>(length) < sizeof path ? std::string(path, length)
+                                                                        : std::string();
 }
 
 // Open keys: a handle names a key path; the table owns the names.
@@ -77,7 +97,9 @@ void RegistryStore::Clear() {
 
 void RegistryStore::Reset() {
     Clear();
-    SetString(kSuiteUninstallKeyWow64, "InstallLocation", DefaultInstallLocation());
+    // Without a known location there is no entry, rather than one that searches the working folder.
+    if (const std::string location = DefaultInstallLocation(); !location.empty())
+        SetString(kSuiteUninstallKeyWow64, "InstallLocation", location);
 }
 
 bool RegistryStore::HasKey(const std::string& subKey) {
@@ -101,26 +123,24 @@ bool RegistryStore::GetString(const std::string& subKey, const std::string& name
 }
 
 std::string RegistryStore::DefaultInstallLocation() {
-    if (const char* location = std::getenv("PIGMO_INSTALL_LOCATION"); location != nullptr && location[0] != 0)
-        return location;
-    // An installed copy keeps its data in <prefix>/share/pigmo beside <prefix>/bin and <prefix>/lib.
-    Dl_info info{};
-    if (dladdr(reinterpret_cast<void*>(&RegistryStore::DefaultInstallLocation), &info) != 0 &&
-        info.dli_fname != nullptr) {
-        std::string module = info.dli_fname;
-        const std::size_t slash = module.rfind('/');
-        if (slash != std::string::npos) {
-            const std::string data = module.substr(0, slash + 1) + "../share/pigmo/";
-            if (IsFolder(data + "Resources/System Palettes")) {
-                if (char* resolved = realpath(data.c_str(), nullptr)) {
-                    std::string location = std::string(resolved) + "/";
-                    std::free(resolved);
-                    return location;
-                }
-            }
-        }
+    if (const char* location = std::getenv("PIGMO_INSTALL_LOCATION");
+        location != nullptr && location[0] != 0) {
+        std::string value = location;
+        // The suite writes its value with the separator; people setting the variable often do not.
+        if (value.back() != '/' && value.back() != '\\') value += '/';
+        return value;
     }
-    return PIGMO_BUILD_DATA_DIR;
+    const std::string module = RealPath(ModuleFile());
+    const std::size_t slash = module.rfind('/');
+    if (slash == std::string::npos) return {};
+    const std::string folder = module.substr(0, slash);
+    const std::string build = RealPath(PIGMO_BUILD_DIR);
+    if (!build.empty() && (folder == build || folder.starts_with(build + "/")))
+        return build + "/share/pigmo/";
+    // An installed copy keeps its data in <prefix>/share/pigmo beside <prefix>/bin and <prefix>/lib.
+    const std::size_t parent = folder.rfind('/');
+    if (parent == std::string::npos) return {};
+    return folder.substr(0, parent) + "/share/pigmo/";
 }
 
 }  // namespace Pigmo::Platform

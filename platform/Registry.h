@@ -22,6 +22,8 @@ inline constexpr const char* kSuiteUninstallKeyWow64 =
     "Software\\Wow6432Node\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\Kromalo Photo_is1";
 inline constexpr const char* kSuiteUninstallKey =
     "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\Kromalo Photo_is1";
+// Bytes its readers give the entry's "InstallLocation", terminator included.
+inline constexpr DWORD kInstallLocationCapacity = 512;
 
 // The in-process registry: string values under HKEY_LOCAL_MACHINE. It starts with the suite's
 // uninstall entry (under kSuiteUninstallKeyWow64) whose "InstallLocation" is the data folder of
@@ -39,7 +41,9 @@ public:
     bool HasKey(const std::string& subKey);
     bool GetString(const std::string& subKey, const std::string& name, std::string& value);
 
-    // "InstallLocation" as the store starts with it, ending with a separator.
+    // "InstallLocation" as the store starts with it, ending with a separator: PIGMO_INSTALL_LOCATION
+    // when set, else the data folder of the installation this code was loaded from (a build tree's
+    // own copy when it runs from a build tree); empty when neither is known.
     static std::string DefaultInstallLocation();
 
 private:

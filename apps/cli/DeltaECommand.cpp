@@ -9,6 +9,7 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "Output.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
 
@@ -53,7 +54,11 @@ std::string MetricNames() {
 std::vector<double> Weights(const std::string& text) {
     std::vector<double> weights;
     std::istringstream items(text);
-    for (std::string item; std::getline(items, item, ',');) weights.push_back(ParseNumber(item));
+    for (std::string item; std::getline(items, item, ',');) {
+        weights.push_back(ParseNumber(item));
+        // Each metric divides by its weights.
+        if (!(weights.back() > 0.0)) throw std::invalid_argument("--weights: '" + item + "' is not positive");
+    }
     return weights;
 }
 
@@ -84,7 +89,9 @@ public:
         }
         double lab[6];
         for (size_t i = 0; i < 6; ++i) lab[i] = ParseNumber(values[i]);
-        std::printf("%.10g\n", metric_->difference(lab, lab + 3, weights_));
+        const double difference = metric_->difference(lab, lab + 3, weights_);
+        RequireFinite(&difference, 1);
+        std::printf("%.10g\n", difference);
     }
 
 private:

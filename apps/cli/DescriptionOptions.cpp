@@ -4,6 +4,7 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <cstdlib>
 #include <iterator>
 #include <sstream>
 #include <stdexcept>
@@ -47,6 +48,7 @@ constexpr int32_t kSRGB = 24;
 constexpr int32_t kLinearSRGB = 25;
 constexpr int32_t kDensity = 1;
 constexpr int32_t kSpectral = 2;
+constexpr int kMaxBands = 100000;
 
 // ParseNumber for an option; flag is the option as typed, for messages.
 double ParseOptionNumber(const std::string& flag, const std::string& text) {
@@ -334,6 +336,18 @@ ColorSpaceStruct DescriptionOptions::Describe(ConversionSide side, int32_t code)
                           description.wavelengthEnd, prefix, description.wavelengthStart);
             throw std::invalid_argument(text);
         }
+        // The engine keeps tables of every band; a fine grid would take gigabytes before any input.
+        const double bands = std::floor((description.wavelengthEnd - description.wavelengthStart) /
+                                        description.wavelengthStep) +
+                             1.0;
+        if (!(bands <= kMaxBands)) {
+            char text[192];
+            std::snprintf(text, sizeof text,
+                          "the grid %g to %g nm by %g nm has %.0f bands; at most %d are allowed (%sstep)",
+                          description.wavelengthStart, description.wavelengthEnd, description.wavelengthStep,
+                          bands, kMaxBands, prefix);
+            throw std::invalid_argument(text);
+        }
     }
     return description;
 }
@@ -407,8 +421,15 @@ double ParseNumber(const std::string& text) {
     double value = 0.0;
     const char* end = text.data() + text.size();
     const auto [ptr, ec] = std::from_chars(text.data() + start, end, value);
-    if (text.size() == start || ec != std::errc() || ptr != end || !std::isfinite(value)) {
+    if (text.size() == start || ptr != end || (ec != std::errc() && ec != std::errc::result_out_of_range) ||
+        std::isnan(value)) {
         throw std::invalid_argument("'" + text + "' is not a number");
     }
+    if (ec == std::errc::result_out_of_range) {
+        // Too small to hold is 0 (or the nearest subnormal), as strtod rounds it; too large is refused.
+        value = std::strtod(text.c_str() + start, nullptr);
+        if (std::isinf(value)) throw std::invalid_argument("'" + text + "' is too large");
+    }
+    if (!std::isfinite(value)) throw std::invalid_argument("'" + text + "' is not a finite number");
     return value;
 }

@@ -1,4 +1,5 @@
 #include <stb/stb_image.h>
+#include <unistd.h>
 
 #include <cerrno>
 #include <charconv>
@@ -12,6 +13,8 @@
 #include <vector>
 
 #include "Commands.h"
+#include "Output.h"
+#include "RegularFile.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
 
@@ -20,6 +23,7 @@ namespace {
 struct ExtractArguments {
     std::string image;
     std::string count = "10";
+    long long maxPixels = 100'000'000;
     bool json = false;
 };
 
@@ -36,12 +40,30 @@ struct DecodedImage {
     int height = 0;
 };
 
-DecodedImage Load(const std::string& path) {
-    const std::unique_ptr<FILE, int (*)(FILE*)> file(std::fopen(path.c_str(), "rb"), std::fclose);
-    if (!file) throw std::runtime_error("cannot open image '" + path + "': " + std::strerror(errno));
+// Reads the header before decoding, so a small file declaring a huge image is refused unread.
+DecodedImage Load(const std::string& path, long long maxPixels) {
+    std::string problem;
+    const int fd = Pigmo::Platform::OpenRegularFile(path, problem);
+    if (fd < 0) throw std::runtime_error("cannot open image '" + path + "': " + problem);
+    const std::unique_ptr<FILE, int (*)(FILE*)> file(fdopen(fd, "rb"), std::fclose);
+    if (!file) {
+        close(fd);
+        throw std::runtime_error("cannot open image '" + path +
+                                 "': " + Pigmo::Platform::SystemErrorText(errno));
+    }
     DecodedImage image;
     int channels = 0;
-    image.rgba.reset(stbi_load_from_file(file.get(), &image.width, &image.height, &channels, 4));
+    if (stbi_info_from_file(file.get(), &image.width, &image.height, &channels) != 0) {
+        const long long pixels = static_cast<long long>(image.width) * static_cast<long long>(image.height);
+        if (pixels > maxPixels) {
+            char text[160];
+            std::snprintf(text, sizeof text,
+                          "is %d x %d pixels (%.1f megapixels), above the limit of %lld pixels", image.width,
+                          image.height, static_cast<double>(pixels) / 1e6, maxPixels);
+            throw std::runtime_error("image '" + path + "' " + text + " (--max-pixels)");
+        }
+        image.rgba.reset(stbi_load_from_file(file.get(), &image.width, &image.height, &channels, 4));
+    }
     if (!image.rgba) {
         const char* reason = stbi_failure_reason();
         throw std::runtime_error("cannot decode image '" + path +
@@ -104,7 +126,7 @@ void PrintJson(const ExtractArguments& arguments, const DecodedImage& image,
     }
     const nlohmann::json document = {
         {"image", arguments.image}, {"width", image.width}, {"height", image.height}, {"colors", list}};
-    std::printf("%s\n", document.dump(2).c_str());
+    WriteOut(document.dump(2, ' ', false, nlohmann::json::error_handler_t::replace) + "\n");
 }
 
 void PrintText(const std::vector<DominantColor>& colors) {
@@ -118,7 +140,7 @@ void PrintText(const std::vector<DominantColor>& colors) {
 
 void RunExtract(const ExtractArguments& arguments) {
     const int count = ParseCount(arguments.count);
-    DecodedImage image = Load(arguments.image);
+    DecodedImage image = Load(arguments.image, arguments.maxPixels);
     const std::vector<DominantColor> colors = Dominant(image, count);
     if (arguments.json) {
         PrintJson(arguments, image, colors);
@@ -135,6 +157,11 @@ void AddExtractCommand(CLI::App& app, int& exitCode) {
     command->add_option("IMAGE", arguments->image, "PNG, JPEG, BMP or TGA file")->required();
     command->add_option("-n,--count", arguments->count, "How many colors, at most (1 to 267)")
         ->type_name("N")
+        ->capture_default_str();
+    command->add_option("--max-pixels", arguments->maxPixels, "Refuse images with more pixels than this")
+        ->type_name("N")
+        ->check(
+            [](const std::string& text) { return text.starts_with('-') ? "'" + text + "' is negative" : ""; })
         ->capture_default_str();
     command->add_flag("--json", arguments->json, "Print a JSON document instead of a table");
     command->footer(

@@ -7,6 +7,7 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "Output.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
 
@@ -44,6 +45,7 @@ void RunHarmony(const HarmonyArguments& arguments) {
         count = 2;
     }
     if (status != 1) throw std::runtime_error("the color could not be converted");
+    RequireFinite(out[0], 3 * static_cast<size_t>(count));
     for (int i = 0; i < count; ++i) std::printf("%.10g %.10g %.10g\n", out[i][0], out[i][1], out[i][2]);
 }
 

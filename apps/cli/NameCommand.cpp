@@ -6,6 +6,7 @@
 
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "Output.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
 
@@ -17,9 +18,10 @@ void RunName(const std::vector<std::string>& arguments) {
     const int index = BPCentroidGetForLab(lab);
     if (index < 1) throw std::runtime_error("no centroid found for this color");
     const int category = BPCentroidGetCategory(index);
+    const double distance = BPCalculateDeltaE(lab, BPCentroidGetLab(index));
+    RequireFinite(&distance, 1);
     std::printf("index: %d\nname: %s\ncategory: %d %s\ndistance: %.4f\n", index, BPCentroidGetName(index),
-                category, BPCentroidGetCategoryName(category),
-                BPCalculateDeltaE(lab, BPCentroidGetLab(index)));
+                category, BPCentroidGetCategoryName(category), distance);
 }
 
 }  // namespace

@@ -3,25 +3,32 @@
 #include <string>
 #include <vector>
 
+#include "ColorBookReader.h"
 #include "Commands.h"
+#include "Output.h"
 #include "PaletteDiscovery.h"
 #include "Paths.h"
+#include "Settings.h"
 #include "ValueLines.h"
 
 namespace {
 
 void RunPalettes() {
+    for (const std::string& problem : Pigmo::Platform::UnusableSettings())
+        std::fprintf(stderr, "pigmo palettes: warning: %s\n", Printable(problem).c_str());
     std::size_t systemCount = 0;
     const std::vector<std::string> paths = Pigmo::CollectPalettePaths(&systemCount);
-    std::string listing;
     for (std::size_t i = 0; i < paths.size(); ++i) {
-        const std::string name = Pigmo::PaletteDisplayName(paths[i].c_str());
-        listing += std::string(i < systemCount ? "system" : "user  ") + "  " +
-                   (name.empty() ? "(not a readable book)" : name) + "\n        " +
-                   Pigmo::Platform::NativePath(paths[i]) + "\n";
+        std::string name;
+        const char* ignored = nullptr;
+        if (!Pigmo::ReadPaletteName(paths[i].c_str(), name, &ignored))
+            name = "(not a readable book)";
+        else
+            name = name.empty() ? "(unnamed palette)" : Printable(name);
+        WriteOut(std::string(i < systemCount ? "system" : "user  ") + "  " + name + "\n        " +
+                 Printable(Pigmo::Platform::NativePath(paths[i])) + "\n");
     }
-    if (paths.empty()) listing = "no palettes found\n";
-    if (std::fputs(listing.c_str(), stdout) < 0) throw std::runtime_error("cannot write the output");
+    if (paths.empty()) WriteOut("no palettes found\n");
 }
 
 }  // namespace
@@ -30,8 +37,11 @@ void AddPalettesCommand(CLI::App& app, int& exitCode) {
     CLI::App* command = app.add_subcommand("palettes", "List the palette files found on this machine");
     command->footer(
         "Lists each palette's name and path: first the system palettes (\"Resources/System Palettes/\" "
-        "below the suite's InstallLocation: the data folder of this installation, or PIGMO_INSTALL_LOCATION, "
-        "which must end with a separator), then the user's (Pigmo/Tintora/User/ below $XDG_DATA_HOME, "
-        "else ~/.local/share), each in name order.");
+        "below the suite's InstallLocation: the data folder of this installation, or "
+        "PIGMO_INSTALL_LOCATION), "
+        "then the user's (Pigmo/Tintora/User/ below $XDG_DATA_HOME, else ~/.local/share), each in name "
+        "order. A name is read from the start of its book only; a book damaged further on is listed with its "
+        "name and reports the damage when it is opened. Settings that cannot be used are reported on "
+        "stderr.");
     command->callback([&exitCode] { exitCode = RunCommand("palettes", RunPalettes); });
 }

@@ -8,6 +8,7 @@
 #include "ColorTranslator.h"
 #include "Commands.h"
 #include "DescriptionOptions.h"
+#include "Output.h"
 #include "ValueLines.h"
 
 namespace {
@@ -56,8 +57,12 @@ public:
         if (translator_.Translate(in_.data(), out_.data()) != 0) {
             throw std::runtime_error(PairText() + "the conversion failed");
         }
-        const std::string line = json_ ? JsonLine() : TextLine();
-        std::fputs(line.c_str(), stdout);
+        try {
+            RequireFinite(out_.data(), out_.size());
+        } catch (const std::runtime_error& e) {
+            throw std::runtime_error(PairText() + e.what());
+        }
+        WriteOut(json_ ? JsonLine() : TextLine());
     }
 
 private:

@@ -1,8 +1,30 @@
 #include "ValueLines.h"
 
 #include <cstdio>
-#include <iostream>
+#include <new>
 #include <stdexcept>
+
+#include "Output.h"
+
+namespace {
+
+// Reads one line of standard input without its newline; false at the end of the input. A line
+// longer than kMaxLineBytes throws rather than growing without bound.
+bool ReadLine(std::string& line) {
+    line.clear();
+    int c = 0;
+    while ((c = getc_unlocked(stdin)) != EOF && c != '\n') {
+        if (line.size() == kMaxLineBytes) {
+            throw std::length_error("longer than " + std::to_string(kMaxLineBytes) +
+                                    " bytes, the most a line may hold");
+        }
+        line += static_cast<char>(c);
+    }
+    if (std::ferror(stdin)) throw std::runtime_error("cannot read standard input");
+    return c == '\n' || !line.empty();
+}
+
+}  // namespace
 
 std::vector<std::string> SplitLine(const std::string& line) {
     std::vector<std::string> values;
@@ -19,15 +41,19 @@ std::vector<std::string> SplitLine(const std::string& line) {
 }
 
 int RunCommand(const std::string& command, const std::function<void()>& work) {
+    std::string failure;
     try {
         work();
-        if (std::fflush(stdout) != 0) throw std::runtime_error("cannot write the output");
-        return 0;
+        if (std::fflush(stdout) == 0) return 0;
+        failure = "cannot write the output";
+    } catch (const std::bad_alloc&) {
+        failure = "out of memory";
     } catch (const std::exception& e) {
-        std::fflush(stdout);
-        std::fprintf(stderr, "pigmo %s: %s\n", command.c_str(), e.what());
-        return 1;
+        failure = Printable(e.what());
     }
+    std::fflush(stdout);
+    std::fprintf(stderr, "pigmo %s: %s\n", command.c_str(), failure.c_str());
+    return 1;
 }
 
 void ForEachValueLine(const std::vector<std::string>& values,
@@ -37,11 +63,14 @@ void ForEachValueLine(const std::vector<std::string>& values,
         return;
     }
     std::string line;
-    for (int number = 1; std::getline(std::cin, line); ++number) {
-        const std::vector<std::string> lineValues = SplitLine(line);
-        if (lineValues.empty()) continue;
+    for (int number = 1;; ++number) {
         try {
-            handle(lineValues);
+            if (!ReadLine(line)) break;
+            if (number == 1 && line.starts_with("\xEF\xBB\xBF")) line.erase(0, 3);
+            const std::vector<std::string> lineValues = SplitLine(line);
+            if (!lineValues.empty()) handle(lineValues);
+        } catch (const std::bad_alloc&) {
+            throw;
         } catch (const std::exception& e) {
             throw std::runtime_error("line " + std::to_string(number) + ": " + e.what());
         }

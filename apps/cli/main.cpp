@@ -1,13 +1,34 @@
 #include <CLI/CLI.hpp>
+#include <cctype>
+#include <cstdio>
+#include <new>
+#include <string>
+#include <vector>
 
 #include "Commands.h"
+#include "Output.h"
 
-int main(int argc, char** argv) {
+namespace {
+
+// The parser takes "-.5" for an option; written "-0.5" it is the value it means.
+std::vector<std::string> Arguments(int argc, char** argv) {
+    std::vector<std::string> arguments(argv + 1, argv + argc);
+    for (std::string& argument : arguments) {
+        if (argument.size() > 2 && argument[0] == '-' && argument[1] == '.' &&
+            std::isdigit(static_cast<unsigned char>(argument[2])))
+            argument.insert(1, "0");
+    }
+    // The parser takes its arguments last first.
+    return {arguments.rbegin(), arguments.rend()};
+}
+
+int Run(int argc, char** argv) {
     CLI::App app{"pigmo: color conversions, color differences, ISCC-NBS names, harmonies and color books"};
+    app.name("pigmo");
     app.require_subcommand(1);
     // One line per error; the hint to --help rides on the same line.
     app.failure_message([](const CLI::App*, const CLI::Error& e) {
-        return "pigmo: " + std::string(e.what()) + " (see --help)\n";
+        return "pigmo: " + Printable(e.what()) + " (see --help)\n";
     });
     int exitCode = 0;
     AddTranslateCommand(app, exitCode);
@@ -18,9 +39,24 @@ int main(int argc, char** argv) {
     AddBookCommand(app, exitCode);
     AddPalettesCommand(app, exitCode);
     try {
-        app.parse(argc, argv);
+        std::vector<std::string> arguments = Arguments(argc, argv);
+        app.parse(arguments);
     } catch (const CLI::ParseError& e) {
         return app.exit(e);
     }
     return exitCode;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    // The commands catch their own failures; this is for the parser and the setup around them.
+    try {
+        return Run(argc, argv);
+    } catch (const std::bad_alloc&) {
+        std::fputs("pigmo: out of memory\n", stderr);
+    } catch (const std::exception& e) {
+        std::fprintf(stderr, "pigmo: %s\n", Printable(e.what()).c_str());
+    }
+    return 1;
 }

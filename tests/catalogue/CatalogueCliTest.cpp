@@ -79,7 +79,7 @@ TEST_F(PigmoCli, ErrorsAreOneLineOnStandardError) {
         {"name 50 abc 0", "'abc' is not a number"},
         {"name", "LAB is required"},
         {"extract", "IMAGE is required"},
-        {"extract " + root_ + "/missing.png", "No such file or directory"},
+        {"extract " + root_ + "/missing.png", "no such file or directory"},
         {"extract " + root_ + "/notes.txt", "cannot decode image"},
         {"extract " + root_ + "/notes.txt" + " -n 0", "not a whole number from 1 to 267"},
         {"extract " + root_ + "/notes.txt" + " -n many", "not a whole number from 1 to 267"},

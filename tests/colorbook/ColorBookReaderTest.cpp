@@ -145,8 +145,9 @@ INSTANTIATE_TEST_SUITE_P(Cases, ColorElement, testing::ValuesIn(ColorCases()),
 
 struct FailureCase {
     const char* label;
-    const char* content;  // null: no file; "<dir>" / "<fifo>" / "<dangling>": that kind of entry
+    const char* content;  // null: no file; "<dir>" / "<fifo>" / "<dangling>" / "<loop>": that kind of entry
     const char* expected;
+    const char* cause;  // the start of what a tool may add to the text
 };
 
 class OpenFailure : public BookFolder, public testing::WithParamInterface<FailureCase> {};
@@ -161,6 +162,8 @@ TEST_P(OpenFailure, ReportsTheTableText) {
         ASSERT_EQ(mkfifo(path.c_str(), 0600), 0);
     } else if (std::strcmp(c.content, "<dangling>") == 0) {
         std::filesystem::create_symlink(root_ + "/gone.cxf", path);
+    } else if (std::strcmp(c.content, "<loop>") == 0) {
+        std::filesystem::create_symlink(path, path);
     } else {
         Write("entry.cxf", c.content);
     }
@@ -172,6 +175,16 @@ TEST_P(OpenFailure, ReportsTheTableText) {
     const std::string expected =
         std::strstr(c.expected, "%s") ? "ColorBook file '" + path + "' doesn't exist" : c.expected;
     EXPECT_EQ(error, expected);
+
+    struct Ignore final : Pigmo::ColorBookVisitor {
+        void Begin(const std::string&, std::size_t) override { ADD_FAILURE(); }
+        void Color(const ColorInformation&, const std::vector<double>&) override { ADD_FAILURE(); }
+    } ignore;
+    Pigmo::ColorBookFailure failure{"untouched", true};
+    EXPECT_FALSE(Pigmo::ReadColorBook(path.c_str(), ignore, &error, &failure));
+    EXPECT_TRUE(failure.cause.starts_with(c.cause)) << failure.cause;
+    EXPECT_EQ(failure.cause.empty(), c.cause[0] == 0) << failure.cause;
+    EXPECT_FALSE(failure.outOfMemory);
 
     std::string name = "kept";
     error = nullptr;
@@ -187,19 +200,25 @@ constexpr const char* kMissing = "%s";
 INSTANTIATE_TEST_SUITE_P(
     Cases, OpenFailure,
     testing::Values(
-        FailureCase{"Missing", nullptr, kMissing}, FailureCase{"DanglingLink", "<dangling>", kMissing},
-        FailureCase{"Empty", "", kInvalid}, FailureCase{"Directory", "<dir>", kInvalid},
-        FailureCase{"Pipe", "<fifo>", kInvalid}, FailureCase{"NotXml", "ColorBook", kInvalid},
-        FailureCase{"Unclosed", "<CxF:CxF xmlns:CxF=\"http://colorexchangeformat.com/v2\">", kInvalid},
-        FailureCase{"RootCase", "<CxF:cxf xmlns:CxF=\"http://colorexchangeformat.com/v2\"/>", kInvalid},
-        FailureCase{"OnlyComment", "<!-- CxF:CxF -->", kInvalid},
+        FailureCase{"Missing", nullptr, kMissing, ""},
+        FailureCase{"DanglingLink", "<dangling>", kMissing, ""},
+        FailureCase{"LinkLoop", "<loop>", kMissing, "too many levels of symbolic links"},
+        FailureCase{"Empty", "", kInvalid, "the file is empty"},
+        FailureCase{"Directory", "<dir>", kInvalid, "is a directory"},
+        FailureCase{"Pipe", "<fifo>", kInvalid, "is a FIFO, not a regular file"},
+        FailureCase{"NotXml", "ColorBook", kInvalid, "XML error at byte "},
+        FailureCase{"Unclosed", "<CxF:CxF xmlns:CxF=\"http://colorexchangeformat.com/v2\">", kInvalid,
+                    "XML error at byte 54: Start-end tags mismatch"},
+        FailureCase{"RootCase", "<CxF:cxf xmlns:CxF=\"http://colorexchangeformat.com/v2\"/>", kInvalid,
+                    "the root element is 'CxF:cxf', not 'CxF:CxF'"},
+        FailureCase{"OnlyComment", "<!-- CxF:CxF -->", kInvalid, "XML error at byte "},
         FailureCase{"NamespaceOffByOne", "<CxF:CxF xmlns:CxF=\"http://colorexchangeformat.com/v3\"/>",
-                    kVersion},
+                    kVersion, "xmlns:CxF is 'http://colorexchangeformat.com/v3'"},
         FailureCase{"NamespaceTrailingSlash", "<CxF:CxF xmlns:CxF=\"http://colorexchangeformat.com/v2/\"/>",
-                    kVersion},
-        FailureCase{"NamespaceMissing", "<CxF:CxF/>", kVersion},
+                    kVersion, "xmlns:CxF is "},
+        FailureCase{"NamespaceMissing", "<CxF:CxF/>", kVersion, "the root has no xmlns:CxF"},
         FailureCase{"NamespaceUnderOtherPrefix", "<CxF:CxF xmlns:cc=\"http://colorexchangeformat.com/v2\"/>",
-                    kVersion}),
+                    kVersion, "the root has no xmlns:CxF"}),
     [](const testing::TestParamInfo<FailureCase>& info) { return info.param.label; });
 
 using Reader = BookFolder;

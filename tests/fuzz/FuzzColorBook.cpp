@@ -1,14 +1,19 @@
-// Feeds arbitrary bytes to the color-book reader as a book file.
+// Feeds arbitrary bytes to the color-book reader as a book file, and checks that the bounded read of
+// a book's start agrees with the whole-document parse.
 
+#include <fcntl.h>
 #include <unistd.h>
 
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
+#include <pugixml.hpp>
 #include <string>
 #include <vector>
 
+#include "BookHead.h"
 #include "ColorBookReader.h"
 
 namespace {
@@ -51,5 +56,26 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     }
     std::string name;
     Pigmo::ReadPaletteName(path.c_str(), name, &error);
+
+    // Whenever the whole book parses, its head says the same of the root and the first palette.
+    constexpr unsigned int kOptions = pugi::parse_default | pugi::parse_comments | pugi::parse_trim_pcdata;
+    char* copy = static_cast<char*>(pugi::get_memory_allocation_function()(size + 1));
+    if (size > 0) std::memcpy(copy, data, size);
+    pugi::xml_document whole;  // parsed in place, as the reader does
+    if (whole.load_buffer_inplace_own(copy, size, kOptions, pugi::encoding_auto)) {
+        const int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+        std::string head;
+        if (fd < 0 || !Pigmo::ReadBookHead(fd, head, 1 + size % 7)) std::abort();
+        close(fd);
+        pugi::xml_document part;
+        if (!part.load_buffer(head.data(), head.size(), kOptions, pugi::encoding_auto)) std::abort();
+        const pugi::xml_node a = whole.document_element(), b = part.document_element();
+        const pugi::xml_node pa = a.child("CxF:Palette"), pb = b.child("CxF:Palette");
+        if (std::strcmp(a.name(), b.name()) != 0 ||
+            std::strcmp(a.attribute("xmlns:CxF").value(), b.attribute("xmlns:CxF").value()) != 0 ||
+            !pa != !pb ||
+            std::strcmp(pa.attribute("PaletteName").value(), pb.attribute("PaletteName").value()) != 0)
+            std::abort();
+    }
     return 0;
 }

@@ -45,4 +45,11 @@ expect_output "$work/outside-cmake/outside" find_package
 
 got=$("$prefix/bin/pigmo" translate lab lch 50 0 -10) || fail "the installed pigmo failed"
 [ "$got" = "50 10 270" ] || fail "the installed pigmo printed '$got'"
-echo "installed copy: pkg-config and find_package builds work"
+# The installed copy lists its own palettes however it is started: through PATH, or with a faked argv[0].
+book="$(realpath "$prefix")/share/pigmo/Resources/System Palettes/ISCC-NBS Centroid Colors.cxf"
+listed=$(env -u PIGMO_INSTALL_LOCATION PATH="$prefix/bin:$PATH" pigmo palettes) || fail "pigmo palettes failed"
+[[ $listed == *"$book"* ]] || fail "pigmo started through PATH listed: $listed"
+listed=$(env -u PIGMO_INSTALL_LOCATION bash -c 'exec -a /nowhere/bin/pigmo "$0" palettes' "$prefix/bin/pigmo") \
+  || fail "pigmo palettes with a faked name failed"
+[[ $listed == *"$book"* ]] || fail "pigmo started as /nowhere/bin/pigmo listed: $listed"
+echo "installed copy: pkg-config and find_package builds work, palettes found from the installation"

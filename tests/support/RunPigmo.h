@@ -23,13 +23,16 @@ inline std::string ReadWholeFile(const std::filesystem::path& path) {
     return text.str();
 }
 
-// ARGUMENTS are shell words after "pigmo"; INPUT goes to standard input.
-inline RunResult RunPigmo(const std::string& arguments, const std::string& input = "") {
+// ARGUMENTS are shell words after "pigmo"; INPUT goes to standard input. SHELL_PREFIX comes before the
+// command: a "ulimit ...;" or variable assignments.
+inline RunResult RunPigmo(const std::string& arguments, const std::string& input = "",
+                          const std::string& shellPrefix = "") {
     char pattern[] = "/tmp/pigmo-cli-test-XXXXXX";
     const std::filesystem::path dir = mkdtemp(pattern);
-    std::ofstream(dir / "in") << input;
-    const std::string command = std::string("'") + PIGMO_CLI + "' " + arguments + " <'" + (dir / "in").string() +
-                                "' >'" + (dir / "out").string() + "' 2>'" + (dir / "err").string() + "'";
+    std::ofstream(dir / "in", std::ios::binary) << input;
+    const std::string command = shellPrefix + " '" + PIGMO_CLI + "' " + arguments + " <'" +
+                                (dir / "in").string() + "' >'" + (dir / "out").string() + "' 2>'" +
+                                (dir / "err").string() + "'";
     const int status = std::system(command.c_str());
     RunResult result;
     result.exitCode = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
