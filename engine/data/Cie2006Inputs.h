@@ -17,10 +17,14 @@ struct Cie2006Row {
 
 extern const Cie2006Row kCie2006Inputs[kCie2006Count];
 
-// XYZ from cone fundamentals goes through the inverse of this LMS-from-XYZ matrix (row-major).
+// CIE 170-2:2015, l-bar, m-bar, s-bar to x-bar, y-bar, z-bar of the 2- and 10-degree observers (row-major)
 // clang-format off
-inline constexpr double kCie2006LmsFromXyz[9] = {
-    0.38971, 0.68898, -0.07868,
-    -0.22981, 1.18340, 0.04641,
-    0.0, 0.0, 1.0};
+inline constexpr double kCie2015Matrix2[9] = {
+    1.94735469, -1.41445123, 0.36476327,
+    0.68990272, 0.34832189, 0.0,
+    0.0, 0.0, 1.93485343};
+inline constexpr double kCie2015Matrix10[9] = {
+    1.93986443, -1.34664359, 0.43044935,
+    0.69283932, 0.34967567, 0.0,
+    0.0, 0.0, 2.14687945};
 // clang-format on

@@ -183,9 +183,10 @@ bool cColorSpaceSpectral::TryFixedTable(const ColorSpaceStruct& source) {
 void cColorSpaceSpectral::BuildOnSampleGrid(const ColorSpaceStruct& source, double gridStart,
                                             int32_t gridCount, const std::vector<double>& illuminant) {
     const int32_t shift = static_cast<int32_t>(std::lround((gridStart - start_) / workingStep_));
+    const ObserverFunctions functions = SampleObserver(source.observer, source.observerAge, source.fieldSize,
+                                                       gridStart, workingStep_, gridCount, true);
     for (int c = 0; c < 3; ++c) {
-        const SampledFunction f = SampleObserver(source.observer, source.observerAge, source.fieldSize, c,
-                                                 gridStart, workingStep_, gridCount, true);
+        const SampledFunction& f = functions[c];
         WeightVector& vector = weights_[c];
         if (f.last < f.first) continue;
         vector.first = std::max(f.first + shift, 0);
@@ -204,9 +205,10 @@ void cColorSpaceSpectral::BuildOnSampleGrid(const ColorSpaceStruct& source, doub
 
 void cColorSpaceSpectral::BuildByReduction(const ColorSpaceStruct& source, double gridStart,
                                            int32_t gridCount, const std::vector<double>& illuminant) {
+    const ObserverFunctions functions = SampleObserver(source.observer, source.observerAge, source.fieldSize,
+                                                       gridStart, 1.0, gridCount, false);
     for (int c = 0; c < 3; ++c) {
-        const SampledFunction f = SampleObserver(source.observer, source.observerAge, source.fieldSize, c,
-                                                 gridStart, 1.0, gridCount, false);
+        const SampledFunction& f = functions[c];
         std::vector<double> product(gridCount);
         for (int32_t j = 0; j < gridCount; ++j) product[j] = illuminant[j] * f.values[j];
         WeightVector& vector = weights_[c];

@@ -110,3 +110,33 @@ void PchipEvaluate(const double* x, const double* f, const double* d, int32_t n,
         fe[k] = f[i] + t * (d[i] + t * (c2 + t * c3));
     }
 }
+
+std::vector<double> EvenSplineCurvatures(const double* y, int32_t n) {
+    // Rows 1 to n - 2 of m[i-1] + 4 m[i] + m[i+1] = 6 (y[i-1] - 2 y[i] + y[i+1]). Not-a-knot ends,
+    // m[0] = 2 m[1] - m[2] and its mirror, turn the first and last rows into 6 m = 6 (...).
+    std::vector<double> m(n, 0.0);
+    const int32_t rows = n - 2;
+    std::vector<double> diagonal(rows, 4.0), upper(rows, 1.0), rhs(rows);
+    for (int32_t r = 0; r < rows; ++r) rhs[r] = 6.0 * (y[r] - 2.0 * y[r + 1] + y[r + 2]);
+    diagonal[0] = diagonal[rows - 1] = 6.0;
+    upper[0] = 0.0;
+    for (int32_t r = 1; r < rows; ++r) {
+        const double lower = r == rows - 1 ? 0.0 : 1.0;
+        const double w = lower / diagonal[r - 1];
+        diagonal[r] -= w * upper[r - 1];
+        rhs[r] -= w * rhs[r - 1];
+    }
+    m[rows] = rhs[rows - 1] / diagonal[rows - 1];
+    for (int32_t r = rows - 2; r >= 0; --r) m[r + 1] = (rhs[r] - upper[r] * m[r + 2]) / diagonal[r];
+    m[0] = 2.0 * m[1] - m[2];
+    m[n - 1] = 2.0 * m[n - 2] - m[n - 3];
+    return m;
+}
+
+double EvenSplineValue(const double* y, const double* curvatures, int32_t n, double position) {
+    const int32_t i = std::clamp(static_cast<int32_t>(std::floor(position)), 0, n - 2);
+    const double u = position - i;
+    const double v = 1.0 - u;
+    return v * y[i] + u * y[i + 1] +
+           ((v * v * v - v) * curvatures[i] + (u * u * u - u) * curvatures[i + 1]) / 6.0;
+}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <vector>
 
@@ -11,14 +12,12 @@ struct SampledFunction {
     int32_t last = -1;
 };
 
-// channel 0, 1, 2 = x-bar, y-bar, z-bar of observer 0 (CIE 1931 2-degree), 1 (CIE 1964 10-degree)
-// or 2 (CIE 2006 physiological observer of the given age and field size). Beyond its table a
-// function continues its end segment, never below 0. With trim set only the positive stretch is
-// kept; a function without positive values comes back empty (last < first).
-SampledFunction SampleObserver(int32_t observer, double age, double fieldSize, int32_t channel, double start,
-                               double step, int32_t count, bool trim);
+// x-bar, y-bar, z-bar.
+using ObserverFunctions = std::array<SampledFunction, 3>;
 
-// x-bar, y-bar, z-bar of the CIE 2006 observer on its 390 to 780 nm, 5-nm grid, row-major
-// (79 rows of three). Normalised so that the equal-energy spectrum has equal tristimulus values
-// and the y-bar peak is 1.
-std::vector<double> Cie2006ColorMatchingFunctions(double age, double fieldSize);
+// The functions of observer 0 (CIE 1931 2-degree), 1 (CIE 1964 10-degree) or 2 (CIE 2006
+// physiological observer of the given age and field size). Beyond its table a function continues
+// its end segment, never below 0. With trim set only the positive stretch is kept; a function
+// without positive values comes back empty (last < first).
+ObserverFunctions SampleObserver(int32_t observer, double age, double fieldSize, double start, double step,
+                                 int32_t count, bool trim);

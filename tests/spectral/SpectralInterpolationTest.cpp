@@ -61,4 +61,22 @@ TEST(Pchip, ReproducesLinesAndKnotsAndPreservesMonotonicity) {
     for (size_t i = 0; i < x.size(); ++i) EXPECT_NEAR(out[i], peak[i], 1e-12);
 }
 
+TEST(EvenSpline, ReproducesCubicsAndPassesThroughItsPoints) {
+    // Not-a-knot ends reproduce any cubic, between the points and just beyond them.
+    auto cubic = [](double t) { return 0.5 - 1.5 * t + 0.25 * t * t - 0.02 * t * t * t; };
+    for (int n : {4, 5, 9}) {
+        std::vector<double> y(n);
+        for (int i = 0; i < n; ++i) y[i] = cubic(i);
+        const std::vector<double> curvatures = EvenSplineCurvatures(y.data(), n);
+        for (double t = -0.5; t <= n - 0.5; t += 0.25) {
+            EXPECT_NEAR(EvenSplineValue(y.data(), curvatures.data(), n, t), cubic(t), 1e-12) << n << " " << t;
+        }
+    }
+    // Through any data it meets its points.
+    const std::vector<double> bumpy = {0, 3, -1, 4, 4, 0, 2};
+    const std::vector<double> curvatures = EvenSplineCurvatures(bumpy.data(), 7);
+    for (int i = 0; i < 7; ++i)
+        EXPECT_NEAR(EvenSplineValue(bumpy.data(), curvatures.data(), 7, i), bumpy[i], 1e-12);
+}
+
 }  // namespace
