@@ -95,6 +95,10 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     derivatives_.resize(std::max(sourceGrid_.size(), destinationGrid_.size()));
 
     if (emissive_) {
+        // Equal energy gives equal X, Y and Z only through the functions it is computed with.
+        illuminant_.observer = source.observer;
+        illuminant_.observerAge = source.observerAge;
+        illuminant_.fieldSize = source.fieldSize;
         illuminant_.SetIlluminant(6, 0.0);
     } else if (source.hasIlluminant) {
         illuminant_ = source.illuminant;

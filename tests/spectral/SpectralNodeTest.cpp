@@ -98,13 +98,18 @@ TEST(SpectralNode, FixedSetCarriesTheRowsOutsideTheBandsOnTheEndBands) {
     for (int c = 0; c < 3; ++c) EXPECT_NEAR(xyz[c], full[c], 1e-12);
 }
 
-TEST(SpectralNode, EmissiveUsesEqualEnergyAndTheLuminousFactor) {
-    ColorSpaceStruct d = Spectral(380, 730, 10, 4);
-    d.emissive = true;
-    const std::vector<double> xyz = Xyz(d, std::vector<double>(36, 1.0));
-    EXPECT_NEAR(xyz[1], 68.3, 1e-9);
-    EXPECT_NEAR(xyz[0], 68.3, 0.03);  // the equal-energy white of the 1931 functions
-    EXPECT_NEAR(xyz[2], 68.3, 0.03);
+TEST(SpectralNode, EmissiveUsesTheObserversOwnEqualEnergyWhiteAndTheLuminousFactor) {
+    for (int observer : {0, 1, 2}) {
+        ColorSpaceStruct d = Spectral(380, 730, 10, 4, 1, 5003, observer);
+        d.emissive = true;
+        IlluminantStruct equalEnergy;
+        equalEnergy.observer = observer;
+        equalEnergy.SetIlluminant(6, 0);
+        const std::vector<double> xyz = Xyz(d, std::vector<double>(36, 1.0));
+        EXPECT_NEAR(xyz[1], 68.3, 1e-9) << observer;
+        EXPECT_NEAR(xyz[0], 68.3 * equalEnergy.relativeWhite[0], 1e-9) << observer;
+        EXPECT_NEAR(xyz[2], 68.3 * equalEnergy.relativeWhite[2], 1e-9) << observer;
+    }
 }
 
 TEST(SpectralNode, UnavailableIlluminantActsAsNone) {
