@@ -1,12 +1,16 @@
 #pragma once
 
-// The few Windows types and constants the palette code is written against.
+// The few Windows types and constants the plug-in and the palette code are written against.
 
 #include <cstdint>
 
 using BOOL = int;
 using BYTE = unsigned char;
+using WORD = std::uint16_t;
 using DWORD = std::uint32_t;
+using UINT = unsigned int;
+using ULONG = unsigned long;
+using USHORT = unsigned short;
 using LONG = std::int32_t;
 using HRESULT = std::int32_t;
 using LPBYTE = BYTE*;
@@ -15,6 +19,13 @@ using LPSTR = char*;
 using LPCSTR = const char*;
 using HANDLE = void*;
 using HWND = struct HWND__*;
+using HINSTANCE = struct HINSTANCE__*;
+using WPARAM = std::uintptr_t;
+using LPARAM = std::intptr_t;
+using LRESULT = std::intptr_t;
+using INT_PTR = std::intptr_t;
+using DWORD_PTR = std::uintptr_t;
+using COLORREF = DWORD;
 using HKEY = struct HKEY__*;
 
 inline constexpr BOOL TRUE = 1;

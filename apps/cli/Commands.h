@@ -10,3 +10,4 @@ void AddNameCommand(CLI::App& app, int& exitCode);
 void AddExtractCommand(CLI::App& app, int& exitCode);
 void AddBookCommand(CLI::App& app, int& exitCode);
 void AddPalettesCommand(CLI::App& app, int& exitCode);
+void AddMapCommand(CLI::App& app, int& exitCode);

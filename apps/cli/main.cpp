@@ -23,7 +23,7 @@ std::vector<std::string> Arguments(int argc, char** argv) {
 }
 
 int Run(int argc, char** argv) {
-    CLI::App app{"pigmo: color conversions, color differences, ISCC-NBS names, harmonies and color books"};
+    CLI::App app{"pigmo: color conversions, color differences, ISCC-NBS names, harmonies, color books and the Color Map"};
     app.name("pigmo");
     app.require_subcommand(1);
     // One line per error; the hint to --help rides on the same line.
@@ -38,6 +38,7 @@ int Run(int argc, char** argv) {
     AddExtractCommand(app, exitCode);
     AddBookCommand(app, exitCode);
     AddPalettesCommand(app, exitCode);
+    AddMapCommand(app, exitCode);
     try {
         std::vector<std::string> arguments = Arguments(argc, argv);
         app.parse(arguments);

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <cstdlib>
+#include <optional>
 #include <string>
 
+#include "Registry.h"
 #include "TempFolder.h"
 
 // A temporary folder per test with small CxF books written into it.
@@ -16,4 +19,33 @@ protected:
     static std::string ColorSet(const std::string& colors) {
         return "<CxF:ColorSet>" + colors + "</CxF:ColorSet>";
     }
+};
+
+// Books in a folder of their own, with an empty registry and the user's data folder inside the test's
+// folder, so only the palettes a test writes are found.
+class PaletteFolders : public BookFolder {
+protected:
+    void SetUp() override {
+        BookFolder::SetUp();
+        if (const char* xdg = std::getenv("XDG_DATA_HOME")) savedXdg_ = xdg;
+        setenv("XDG_DATA_HOME", (root_ + "/data").c_str(), 1);
+        Pigmo::Platform::RegistryStore::Instance().Clear();
+    }
+    void TearDown() override {
+        if (savedXdg_)
+            setenv("XDG_DATA_HOME", savedXdg_->c_str(), 1);
+        else
+            unsetenv("XDG_DATA_HOME");
+        Pigmo::Platform::RegistryStore::Instance().Reset();
+        BookFolder::TearDown();
+    }
+    std::string System(const std::string& name, const std::string& content) {
+        return Write("suite/Resources/System Palettes/" + name, content);
+    }
+    std::string User(const std::string& name, const std::string& content) {
+        return Write("data/Pigmo/Tintora/User/" + name, content);
+    }
+
+private:
+    std::optional<std::string> savedXdg_;
 };

@@ -3,7 +3,6 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -36,31 +35,7 @@ INSTANTIATE_TEST_SUITE_P(Cases, FileName,
                                          FileNameCase{"", ""}));
 
 // Discovery against a fake registry and a fake data home inside the test's folder.
-class Discovery : public BookFolder {
-protected:
-    void SetUp() override {
-        BookFolder::SetUp();
-        if (const char* xdg = std::getenv("XDG_DATA_HOME")) savedXdg_ = xdg;
-        setenv("XDG_DATA_HOME", (root_ + "/data").c_str(), 1);
-        RegistryStore::Instance().Clear();
-    }
-    void TearDown() override {
-        if (savedXdg_)
-            setenv("XDG_DATA_HOME", savedXdg_->c_str(), 1);
-        else
-            unsetenv("XDG_DATA_HOME");
-        RegistryStore::Instance().Reset();
-        BookFolder::TearDown();
-    }
-    std::string System(const std::string& name, const std::string& content) {
-        return Write("suite/Resources/System Palettes/" + name, content);
-    }
-    std::string User(const std::string& name, const std::string& content) {
-        return Write("data/Pigmo/Tintora/User/" + name, content);
-    }
-
-    std::optional<std::string> savedXdg_;
-};
+using Discovery = PaletteFolders;
 
 TEST_F(Discovery, SystemPalettesComeFirstThenTheUsers) {
     RegistryStore::Instance().SetString(Pigmo::Platform::kSuiteUninstallKey, "InstallLocation",

@@ -1,0 +1,24 @@
+#pragma once
+
+// The host application as a plug-in sees it.
+
+#include "maxtypes.h"
+
+class HostExport Interface {
+public:
+    virtual ~Interface() = default;
+    // The main window, owner of message boxes; null when the host runs without windows.
+    virtual HWND GetMAXHWnd() = 0;
+};
+
+HostExport Interface* GetCOREInterface();
+
+inline constexpr int APP_IMAGE_DIR = 7;
+
+// The folders the host is configured with.
+class HostExport IPathConfigMgr {
+public:
+    virtual ~IPathConfigMgr() = default;
+    static IPathConfigMgr* GetPathConfigMgr();
+    virtual const MCHAR* GetDir(int which) const = 0;
+};
