@@ -2,7 +2,9 @@
 
 #include <pigmo/bp.h>
 
+#include <algorithm>
 #include <cmath>
+#include <cstdio>
 
 #include "ColorSpaceSRGB.h"
 
@@ -68,6 +70,16 @@ ColorInformation::ColorInformation(const char* name, const char* category, const
 
 const float* ColorInformation::GetSpectralReflectance() const {
     return reflectance_.empty() ? nullptr : reflectance_.data();
+}
+
+std::string HtmlColorCode(double red, double green, double blue) {
+    // Truncated; the hundredth allowed keeps 39.9958 from a round trip through CIELAB at 40.
+    const auto channel = [](double v) {
+        return static_cast<unsigned>(std::isnan(v) ? 0.0 : std::clamp(v + 0.01, 0.0, 255.0));
+    };
+    char code[8];
+    std::snprintf(code, sizeof code, "#%02X%02X%02X", channel(red), channel(green), channel(blue));
+    return code;
 }
 
 const char* ColorInformation::GetTag(unsigned int index) const {

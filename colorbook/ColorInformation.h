@@ -40,4 +40,9 @@ private:
     std::vector<std::string> tags_;
 };
 
+// The "#RRGGBB" code of an sRGB color on the 0 to 255 scale: each channel clamped to that range and
+// truncated (within a hundredth, the error of a round trip through CIELAB), red first. Every place that
+// shows such a code uses this one.
+std::string HtmlColorCode(double red, double green, double blue);
+
 }  // namespace Pigmo

@@ -3,6 +3,9 @@
 
 #include "Descriptor.h"
 #include "Export.h"
+#include "InformationControl.h"
+#include "PaletteControl.h"
+#include "SpectralChart.h"
 #include "StringTable.h"
 #include "Window.h"
 
@@ -14,9 +17,16 @@ HINSTANCE moduleInstance = nullptr;
 
 constexpr ULONG DLL_PROCESS_ATTACH = 1;
 
-// The rollout's controls paint themselves once the editor is built; until then the host's default
-// procedure answers for them.
-const char* const kControlClasses[] = {"ColorPallette", "ColorInformation", "SpectralChart"};
+// The rollout's own controls.
+struct ControlClass {
+    const char* name;
+    WNDPROC procedure;
+};
+const ControlClass kControlClasses[] = {
+    {"ColorPallette", ColorPalletteProc},
+    {"ColorInformation", ColorInformationProc},
+    {"SpectralChart", SpectralChartProc},
+};
 
 BOOL DllMain(HINSTANCE instance, ULONG reason, void*) {
     if (reason != DLL_PROCESS_ATTACH) return TRUE;
@@ -27,9 +37,9 @@ BOOL DllMain(HINSTANCE instance, ULONG reason, void*) {
     windowClass.hInstance = instance;
     windowClass.hCursor = LoadCursorA(nullptr, IDC_ARROW);
     windowClass.hbrBackground = static_cast<HBRUSH>(GetStockObject(WHITE_BRUSH));
-    for (const char* name : kControlClasses) {
-        windowClass.lpfnWndProc = DefWindowProcA;
-        windowClass.lpszClassName = name;
+    for (const ControlClass& control : kControlClasses) {
+        windowClass.lpfnWndProc = control.procedure;
+        windowClass.lpszClassName = control.name;
         if (RegisterClassA(&windowClass) == 0) break;
     }
     return TRUE;

@@ -169,7 +169,11 @@ IOResult Map::Load(ILoad* iload) {
 }
 
 ParamDlg* Map::CreateParamDlg(HWND hwMtlEdit, IMtlParams* imp) {
-    return descriptor_->CreateParamDlgs(hwMtlEdit, imp, this);
+    IAutoMParamDlg* dialogs = descriptor_->CreateParamDlgs(hwMtlEdit, imp, this);
+    // The host deletes the procedure when the rollout closes.
+    ParamBlockDesc2* description = descriptor_->ParameterDescription();
+    if (dialogs != nullptr && description != nullptr) description->SetUserDlgProc(new MapDlgProc(this));
+    return dialogs;
 }
 
 void Map::EnumAuxFiles(MaxSDK::AssetManagement::AssetEnumCallback& callback, DWORD flags) {

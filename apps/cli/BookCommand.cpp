@@ -27,13 +27,8 @@ std::vector<double> Triple(const float* values) {
     return {values[0], values[1], values[2]};
 }
 
-// #RRGGBB from the 0..255 sRGB values, truncated.
 std::string HtmlCode(const float* sRGB) {
-    char code[8];
-    int channels[3];
-    for (int i = 0; i < 3; ++i) channels[i] = static_cast<int>(std::clamp(sRGB[i], 0.0f, 255.0f));
-    std::snprintf(code, sizeof code, "#%02X%02X%02X", channels[0], channels[1], channels[2]);
-    return code;
+    return Pigmo::HtmlColorCode(sRGB[0], sRGB[1], sRGB[2]);
 }
 
 std::string Format(const char* format, const float* values) {

@@ -12,6 +12,7 @@
 #include <string>
 #include <vector>
 
+#include "ColorInformation.h"
 #include "Commands.h"
 #include "Output.h"
 #include "RegularFile.h"
@@ -29,7 +30,7 @@ struct ExtractArguments {
 
 struct DominantColor {
     double lab[3];
-    char hex[8];
+    std::string hex;
     int centroid;
 };
 
@@ -106,9 +107,7 @@ std::vector<DominantColor> Dominant(DecodedImage& image, int count) {
         if (BPConvertLab2sRGB(mean, rgb) != 1 || color.centroid < 1) {
             throw std::runtime_error("a dominant color could not be converted");
         }
-        std::snprintf(color.hex, sizeof color.hex, "#%02X%02X%02X",
-                      static_cast<unsigned>(std::lround(rgb[0])), static_cast<unsigned>(std::lround(rgb[1])),
-                      static_cast<unsigned>(std::lround(rgb[2])));
+        color.hex = Pigmo::HtmlColorCode(rgb[0], rgb[1], rgb[2]);
         colors.push_back(color);
     }
     return colors;
@@ -134,7 +133,7 @@ void PrintText(const std::vector<DominantColor>& colors) {
     for (size_t i = 0; i < colors.size(); ++i) {
         const DominantColor& color = colors[i];
         std::printf("%-3zu %-7.2f %-8.2f %-8.2f %s  %s\n", i + 1, color.lab[0], color.lab[1], color.lab[2],
-                    color.hex, BPCentroidGetName(color.centroid));
+                    color.hex.c_str(), BPCentroidGetName(color.centroid));
     }
 }
 

@@ -14,6 +14,7 @@
 #include "Descriptor.h"
 #include "IColorPalletteUser.h"
 #include "Json.h"
+#include "MaterialEditor.h"
 #include "MessageBox.h"
 #include "Output.h"
 #include "Paths.h"
@@ -39,6 +40,7 @@ struct MapArguments {
     std::string output;
     std::optional<int> pick;
     int size = 256;
+    int scale = 1;
     bool sphere = false;
     bool json = false;
 };
@@ -108,10 +110,12 @@ void Pick(Texmap& map, int index) {
 // As the rollout's file button does: the parameter alone; the map reads the book and clears the pick.
 void SetBook(Texmap& map, const std::string& file) {
     // The scene may be opened from anywhere.
-    const std::string path = file.empty() ? file : std::filesystem::absolute(file).lexically_normal().string();
+    const std::string path =
+        file.empty() ? file : std::filesystem::absolute(file).lexically_normal().string();
     if (!Parameters(map).SetValue(kBookParameter, 0, path.c_str()))
         throw std::runtime_error("the map took no book");
-    if (ShowMessageBoxes() > 0) throw std::runtime_error("cannot use the book " + file + "; nothing was written");
+    if (ShowMessageBoxes() > 0)
+        throw std::runtime_error("cannot use the book " + file + "; nothing was written");
 }
 
 void RunNew(const MapArguments& arguments) {
@@ -120,7 +124,8 @@ void RunNew(const MapArguments& arguments) {
     Texmap& map = scene.NewMap(Pigmo::ColorMap::kColorMapClassID);
     if (arguments.book.empty()) {
         // A fresh map takes the first system palette and picks its first color itself.
-        if (ShowMessageBoxes() > 0) throw std::runtime_error("cannot use the default book; nothing was written");
+        if (ShowMessageBoxes() > 0)
+            throw std::runtime_error("cannot use the default book; nothing was written");
         if (arguments.pick) Pick(map, *arguments.pick);
     } else {
         Pigmo::Platform::TakeMessageBoxes();  // about the default book, which is replaced at once
@@ -163,7 +168,8 @@ void RunShow(const MapArguments& arguments) {
     Pigmo::IColorPalletteUser& palette = Palette(map);
     const Pigmo::IColorInformation& color = CurrentColor(map);
     std::vector<std::string> tags;
-    for (int i = 0; i < color.GetTagCount(); ++i) tags.emplace_back(color.GetTag(static_cast<unsigned int>(i)));
+    for (int i = 0; i < color.GetTagCount(); ++i)
+        tags.emplace_back(color.GetTag(static_cast<unsigned int>(i)));
     std::vector<float> reflectance;
     if (const float* curve = color.GetSpectralReflectance())
         reflectance.assign(curve, curve + color.GetSpectralReflectanceCount());
@@ -195,19 +201,18 @@ void RunShow(const MapArguments& arguments) {
     }
     const unsigned int count = palette.GetColorCount();
     const int selected = palette.GetSelectedIndex();
-    WriteOut("map:          " + Printable(map.GetName().data()) + "\n" +
-             "book:         " +
-             (book.empty() ? std::string("(none)")
-                           : Printable(book) + " (" + std::to_string(count) + (count == 1 ? " color)" : " colors)")) +
-             "\n" + "selected:     " + (selected == -1 ? std::string("none") : std::to_string(selected)) + "\n" +
-             "name:         " + Printable(color.GetName()) + "\n" +
+    WriteOut("map:          " + Printable(map.GetName().data()) + "\n" + "book:         " +
+             (book.empty()
+                  ? std::string("(none)")
+                  : Printable(book) + " (" + std::to_string(count) + (count == 1 ? " color)" : " colors)")) +
+             "\n" + "selected:     " + (selected == -1 ? std::string("none") : std::to_string(selected)) +
+             "\n" + "name:         " + Printable(color.GetName()) + "\n" +
              "category:     " + Printable(color.GetCategory()) + "\n" +
              "sRGB:         " + Format("%.2f %.2f %.2f", color.GetSRGB()) + "\n" +
              "linear RGB:   " + Format("%.4f %.4f %.4f", color.GetLinearRGB()) + "\n" +
-             "L*a*b*:       " + Format("%.2f %.2f %.2f", color.GetLab()) + "\n" +
-             "tags:         " + tagList + "\n" +
-             "reflectance:  " + std::to_string(reflectance.size()) + " values" + (curve.empty() ? "" : ":" + curve) +
-             "\n");
+             "L*a*b*:       " + Format("%.2f %.2f %.2f", color.GetLab()) + "\n" + "tags:         " + tagList +
+             "\n" + "reflectance:  " + std::to_string(reflectance.size()) + " values" +
+             (curve.empty() ? "" : ":" + curve) + "\n");
 }
 
 void RunRender(const MapArguments& arguments) {
@@ -225,18 +230,20 @@ void RunViewport(const MapArguments& arguments) {
     Texmap& map = FirstMap(scene, arguments.scene);
     Pigmo::Host::ViewportTextures viewport;
     Interval valid;
-    const std::unique_ptr<BITMAPINFO, void (*)(void*)> dib(map.GetVPDisplayDIB(0, viewport, valid), std::free);
+    const std::unique_ptr<BITMAPINFO, void (*)(void*)> dib(map.GetVPDisplayDIB(0, viewport, valid),
+                                                           std::free);
     if (!dib) throw std::runtime_error("the map made no viewport image");
-    Pigmo::Host::WriteFileAtomically(
-        arguments.output, Pigmo::Host::EncodePng16(dib->bmiHeader.biWidth, dib->bmiHeader.biHeight,
-                                                   Pigmo::Host::DIBPixels(dib.get())));
+    Pigmo::Host::WriteFileAtomically(arguments.output,
+                                     Pigmo::Host::EncodePng16(dib->bmiHeader.biWidth, dib->bmiHeader.biHeight,
+                                                              Pigmo::Host::DIBPixels(dib.get())));
 }
 
 void RunMentalRay(const MapArguments& arguments) {
     PluginHost host;
     Scene scene = host.Load(arguments.scene);
     Texmap& map = FirstMap(scene, arguments.scene);
-    auto* translation = dynamic_cast<imrShaderTranslation*>(map.GetInterface(IMRSHADERTRANSLATION_INTERFACE_ID));
+    auto* translation =
+        dynamic_cast<imrShaderTranslation*>(map.GetInterface(IMRSHADERTRANSLATION_INTERFACE_ID));
     if (translation == nullptr) throw std::runtime_error("the map has no mental ray translation");
     Pigmo::Host::ShaderCreation creation;
     auto* shader = dynamic_cast<Pigmo::Host::Shader*>(translation->GetMRShader(creation));
@@ -249,7 +256,8 @@ void RunMentalRay(const MapArguments& arguments) {
     Interval ignored;
     for (int i = 0; i < parameters->NumParams(); ++i) {
         const ParamID id = parameters->IndextoID(i);
-        if (std::string(parameters->GetParamDef(id).int_name) == "color") parameters->GetValue(id, 0, color, ignored);
+        if (std::string(parameters->GetParamDef(id).int_name) == "color")
+            parameters->GetValue(id, 0, color, ignored);
     }
     if (arguments.json) {
         Json shown = Json::object();
@@ -265,10 +273,22 @@ void RunMentalRay(const MapArguments& arguments) {
              "\ncolor:   " + values + "\n");
 }
 
+void RunRollout(const MapArguments& arguments) {
+    PluginHost host;
+    Scene scene = host.Load(arguments.scene);
+    Texmap& map = FirstMap(scene, arguments.scene);
+    // Closed before the scene deletes the map.
+    Pigmo::Host::MaterialEditor editor;
+    editor.Open(map);
+    const Pigmo::Host::Image image = editor.Snapshot(arguments.scale);
+    ShowMessageBoxes();
+    Pigmo::Host::WriteFileAtomically(arguments.output, Pigmo::Host::EncodePng(image));
+}
+
 // One "pigmo map" subcommand: its name in messages, its options and its work.
 CLI::App* AddSubcommand(CLI::App& map, const std::string& name, const std::string& description,
-                        const std::string& footer, int& exitCode, const std::shared_ptr<MapArguments>& arguments,
-                        void (*run)(const MapArguments&)) {
+                        const std::string& footer, int& exitCode,
+                        const std::shared_ptr<MapArguments>& arguments, void (*run)(const MapArguments&)) {
     CLI::App* command = map.add_subcommand(name, description);
     command->footer(footer);
     command->add_option("SCENE", arguments->scene, "the scene file (JSON)")->required();
@@ -281,7 +301,8 @@ CLI::App* AddSubcommand(CLI::App& map, const std::string& name, const std::strin
 }  // namespace
 
 void AddMapCommand(CLI::App& app, int& exitCode) {
-    CLI::App* map = app.add_subcommand("map", "The Color Map in a scene: create, pick, change the book, show, render");
+    CLI::App* map = app.add_subcommand(
+        "map", "The Color Map in a scene: create, pick, change the book, show, render, show its panel");
     map->require_subcommand(1);
     map->footer(
         "A scene is a JSON file of Color Maps; the commands work on its first map. pigmo loads libpigmo.so "
@@ -292,34 +313,39 @@ void AddMapCommand(CLI::App& app, int& exitCode) {
 
     CLI::App* create = AddSubcommand(
         *map, "new", "Make a scene with one new Color Map",
-        "Without --book the map takes the first system palette and picks its first color, as a new map in the "
-        "3D program does; with --book it takes that book and picks color --pick (default 0). SCENE is replaced "
+        "Without --book the map takes the first system palette and picks its first color, as a new map in "
+        "the "
+        "3D program does; with --book it takes that book and picks color --pick (default 0). SCENE is "
+        "replaced "
         "if it exists.\nExample: pigmo map new scene.json --book \"Test Color Samples.cxf\" --pick 3",
         exitCode, arguments, RunNew);
     create->add_option("--book", arguments->book, "the color book (CxF 2.1) to take instead of the default");
     create->add_option("--pick", arguments->pick, "the color of the book to pick, from 0");
 
-    AddSubcommand(*map, "pick", "Pick color N of the map's book (-1 clears the pick)",
-                  "The map copies the color's name, category, sRGB, linear RGB, L*a*b*, reflectance and tags into "
-                  "the scene, so the scene renders it without the book. With -1 those are cleared; the map then "
-                  "renders black.\nExample: pigmo map pick scene.json 5",
-                  exitCode, arguments, RunPick)
+    AddSubcommand(
+        *map, "pick", "Pick color N of the map's book (-1 clears the pick)",
+        "The map copies the color's name, category, sRGB, linear RGB, L*a*b*, reflectance and tags into "
+        "the scene, so the scene renders it without the book. With -1 those are cleared; the map then "
+        "renders black.\nExample: pigmo map pick scene.json 5",
+        exitCode, arguments, RunPick)
         ->add_option("N", arguments->pick, "the color's index in the book, from 0; -1 clears the pick")
         ->required();
 
-    AddSubcommand(*map, "book", "Give the map another color book",
-                  "As the book button of the map's panel does: the book changes and the pick is cleared, but the "
-                  "map keeps rendering the color picked before until another is picked.\n"
-                  "Example: pigmo map book scene.json \"ISCC-NBS Centroid Colors.cxf\"",
-                  exitCode, arguments, RunBook)
+    AddSubcommand(
+        *map, "book", "Give the map another color book",
+        "As the book button of the map's panel does: the book changes and the pick is cleared, but the "
+        "map keeps rendering the color picked before until another is picked.\n"
+        "Example: pigmo map book scene.json \"ISCC-NBS Centroid Colors.cxf\"",
+        exitCode, arguments, RunBook)
         ->add_option("FILE", arguments->book, "the color book (CxF 2.1); \"\" for none")
         ->required();
 
-    AddSubcommand(*map, "show", "Show the map's book and picked color",
-                  "Prints the book, the picked index, and the color the map renders from: name, category, sRGB "
-                  "(0..255), linear RGB (0..1), L*a*b* (D50), tags and reflectance values.\n"
-                  "Example: pigmo map show scene.json --json",
-                  exitCode, arguments, RunShow)
+    AddSubcommand(
+        *map, "show", "Show the map's book and picked color",
+        "Prints the book, the picked index, and the color the map renders from: name, category, sRGB "
+        "(0..255), linear RGB (0..1), L*a*b* (D50), tags and reflectance values.\n"
+        "Example: pigmo map show scene.json --json",
+        exitCode, arguments, RunShow)
         ->add_flag("--json", arguments->json, "print the fields as JSON");
 
     CLI::App* render = AddSubcommand(
@@ -341,6 +367,17 @@ void AddMapCommand(CLI::App& app, int& exitCode) {
                   exitCode, arguments, RunViewport)
         ->add_option("-o,--output", arguments->output, "the PNG file to write")
         ->required();
+
+    CLI::App* rollout = AddSubcommand(
+        *map, "rollout", "Render the map's editor panel to a PNG",
+        "Opens the map's rollout as the 3D program's material editor does, without a window, and writes "
+        "what a person would see: the book list, the palette with its strip, the picked color's fields, "
+        "swatch, information and reflectance curve. --scale enlarges every pixel to S x S pixels.\n"
+        "Example: pigmo map rollout scene.json -o panel.png --scale 2",
+        exitCode, arguments, RunRollout);
+    rollout->add_option("-o,--output", arguments->output, "the PNG file to write")->required();
+    rollout->add_option("--scale", arguments->scale, "pixels per panel pixel, 1 to 8 (default 1)")
+        ->check(CLI::Range(1, Pigmo::Host::kMaxSnapshotScale));
 
     AddSubcommand(*map, "mr", "Show the mental ray shader that stands in for the map",
                   "The shader class the map asks the renderer for, its name and its \"color\" after the map "

@@ -91,6 +91,9 @@ public:
     virtual ~IParamMap2() = default;
     virtual HWND GetHWnd() = 0;
     virtual IParamBlock2* GetParamBlock() = 0;
+    // Installs proc in place of the one the rollout has (which is deleted) and sends it WM_INITDIALOG.
+    virtual void SetUserDlgProc(ParamMap2UserDlgProc* proc = nullptr) = 0;
+    virtual ParamMap2UserDlgProc* GetUserDlgProc() = 0;
 };
 
 class HostExport ParamBlockDesc2 {
@@ -108,8 +111,12 @@ public:
     ParamDef& GetParamDef(ParamID id);
     const ParamDef& paramdef(int index) const { return params_[index]; }
 
+    // The procedure of the open rollout, which is handed it at once; the rollout owns it from then on.
     void SetUserDlgProc(ParamMap2UserDlgProc* proc = nullptr);
     ParamMap2UserDlgProc* GetUserDlgProc() const { return dlgProc_; }
+    // The open rollout of this description; null when none is open.
+    void SetParamMap(IParamMap2* map) { map_ = map; }
+    IParamMap2* GetParamMap() const { return map_; }
 
     BlockID ID;
     CStr int_name;
@@ -123,6 +130,7 @@ public:
 private:
     std::vector<ParamDef> params_;
     ParamMap2UserDlgProc* dlgProc_ = nullptr;
+    IParamMap2* map_ = nullptr;
 };
 
 // The values of one instance's parameters, at time 0 here since nothing is animated.

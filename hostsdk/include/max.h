@@ -4,6 +4,7 @@
 
 #include "assetmanagement.h"
 #include "bitmap.h"
+#include "custcont.h"
 #include "ifnpub.h"
 #include "imtl.h"
 #include "iparamb2.h"

@@ -15,6 +15,17 @@ HostExport Interface* GetCOREInterface();
 
 inline constexpr int APP_IMAGE_DIR = 7;
 
+using ColorId = int;
+
+// The colors of the host's interface, by id; custom controls take every color from here.
+class HostExport IColorManager {
+public:
+    virtual ~IColorManager() = default;
+    virtual COLORREF GetColor(ColorId id) = 0;
+};
+
+HostExport IColorManager* GetColorManager();
+
 // The folders the host is configured with.
 class HostExport IPathConfigMgr {
 public:

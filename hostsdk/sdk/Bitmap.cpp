@@ -1,7 +1,7 @@
+#include "bitmap.h"
+
 #include <algorithm>
 #include <new>
-
-#include "bitmap.h"
 
 namespace {
 

@@ -25,16 +25,23 @@ void ClassDesc2::MakeAutoParamBlocks(ReferenceMaker* owner) {
             owner->ReplaceReference(desc->ref_no, new Pigmo::Host::ParamBlock2(desc));
 }
 
-IAutoMParamDlg* ClassDesc2::CreateParamDlgs(HWND, IMtlParams*, ReferenceTarget* obj) {
-    for (ParamBlockDesc2* desc : descriptions_)
-        if ((desc->flags & P_AUTO_UI) != 0) return new Pigmo::Host::AutoMParamDlg(ClassID(), obj, desc->ID);
-    return nullptr;
+// Null when a rollout cannot be built (its template or a control's class is missing).
+IAutoMParamDlg* ClassDesc2::CreateParamDlgs(HWND hwMtlEdit, IMtlParams*, ReferenceTarget* obj) {
+    std::vector<std::unique_ptr<Pigmo::Host::ParamMap2>> maps;
+    for (ParamBlockDesc2* desc : descriptions_) {
+        if ((desc->flags & P_AUTO_UI) == 0) continue;
+        maps.push_back(std::make_unique<Pigmo::Host::ParamMap2>(*desc, obj, hwMtlEdit));
+        if (maps.back()->GetHWnd() == nullptr) return nullptr;
+    }
+    if (maps.empty()) return nullptr;
+    return new Pigmo::Host::AutoMParamDlg(ClassID(), obj, std::move(maps));
 }
 
 void ClassDesc2::Reset(ReferenceTarget* obj, BOOL updateUI, BOOL callSetHandlers) {
     for (ParamBlockDesc2* desc : descriptions_) {
         if ((desc->flags & P_AUTO_CONSTRUCT) == 0) continue;
-        if (IParamBlock2* block = obj->GetParamBlockByID(desc->ID)) block->ResetAll(updateUI, callSetHandlers);
+        if (IParamBlock2* block = obj->GetParamBlockByID(desc->ID))
+            block->ResetAll(updateUI, callSetHandlers);
     }
 }
 

@@ -18,8 +18,9 @@ void FPInterfaceDesc::LoadDescriptor(Interface_ID id, const MCHAR* int_name, Str
     va_end(args);
     // The host publishes no functions; reading past something else would misread the caller's list.
     if (tag != p_end) {
-        std::fprintf(stderr, "FPInterfaceDesc \"%s\": published functions are not supported (tag 0x%X before p_end)\n",
-                     internal_name.data(), static_cast<unsigned>(tag));
+        std::fprintf(
+            stderr, "FPInterfaceDesc \"%s\": published functions are not supported (tag 0x%X before p_end)\n",
+            internal_name.data(), static_cast<unsigned>(tag));
         std::abort();
     }
     if (cd != nullptr) cd->AddInterface(this);

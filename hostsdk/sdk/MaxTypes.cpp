@@ -1,6 +1,6 @@
-#include <algorithm>
-
 #include "maxtypes.h"
+
+#include <algorithm>
 
 Interval& Interval::operator&=(const Interval& other) {
     if (Empty() || other.Empty()) {

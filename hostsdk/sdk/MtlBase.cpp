@@ -30,7 +30,8 @@ IOResult MtlBase::Load(ILoad* iload) {
 }
 
 IOResult MtlBase::Save(ISave* isave) {
-    if (isave->WriteString("name", name_) != IO_OK || isave->WriteInt("gbufID", gbufID) != IO_OK) return IO_ERROR;
+    if (isave->WriteString("name", name_) != IO_OK || isave->WriteInt("gbufID", gbufID) != IO_OK)
+        return IO_ERROR;
     return IO_OK;
 }
 

@@ -13,12 +13,17 @@ namespace {
 // Where a kind's values sit in ParamValue.
 std::size_t Alternative(ParamKind kind) {
     switch (kind) {
-        case ParamKind::Int: return 0;
-        case ParamKind::Float: return 1;
+        case ParamKind::Int:
+            return 0;
+        case ParamKind::Float:
+            return 1;
         case ParamKind::Vector:
-        case ParamKind::Color4: return 2;
-        case ParamKind::Text: return 3;
-        case ParamKind::File: return 4;
+        case ParamKind::Color4:
+            return 2;
+        case ParamKind::Text:
+            return 3;
+        case ParamKind::File:
+            return 4;
     }
     return 0;
 }
@@ -37,14 +42,27 @@ bool Finite(std::initializer_list<float> values) {
 bool KindOf(ParamType2 type, ParamKind& kind) {
     switch (type & ~TYPE_TAB) {
         case TYPE_INT:
-        case TYPE_BOOL: kind = ParamKind::Int; return true;
-        case TYPE_FLOAT: kind = ParamKind::Float; return true;
+        case TYPE_BOOL:
+            kind = ParamKind::Int;
+            return true;
+        case TYPE_FLOAT:
+            kind = ParamKind::Float;
+            return true;
         case TYPE_POINT3:
-        case TYPE_RGBA: kind = ParamKind::Vector; return true;
-        case TYPE_FRGBA: kind = ParamKind::Color4; return true;
-        case TYPE_STRING: kind = ParamKind::Text; return true;
-        case TYPE_FILENAME: kind = ParamKind::File; return true;
-        default: return false;
+        case TYPE_RGBA:
+            kind = ParamKind::Vector;
+            return true;
+        case TYPE_FRGBA:
+            kind = ParamKind::Color4;
+            return true;
+        case TYPE_STRING:
+            kind = ParamKind::Text;
+            return true;
+        case TYPE_FILENAME:
+            kind = ParamKind::File;
+            return true;
+        default:
+            return false;
     }
 }
 
@@ -67,18 +85,25 @@ ParamBlock2::ParamBlock2(ParamBlockDesc2* desc) : desc_(desc) {
 
 ParamValue ParamBlock2::DefaultValue(const ParamDef& def) const {
     switch (KindOf(def)) {
-        case ParamKind::Int: return ParamValue(std::in_place_type<int>, def.def_i);
-        case ParamKind::Float: return ParamValue(std::in_place_type<float>, def.def_f);
-        case ParamKind::Vector: return AColor(def.def_c.r, def.def_c.g, def.def_c.b, 0.0f);
-        case ParamKind::Color4: return def.def_c;
-        case ParamKind::Text: return std::string(def.def_s.data());
-        case ParamKind::File: return FileAsset(def.def_s, def.asset_type);
+        case ParamKind::Int:
+            return ParamValue(std::in_place_type<int>, def.def_i);
+        case ParamKind::Float:
+            return ParamValue(std::in_place_type<float>, def.def_f);
+        case ParamKind::Vector:
+            return AColor(def.def_c.r, def.def_c.g, def.def_c.b, 0.0f);
+        case ParamKind::Color4:
+            return def.def_c;
+        case ParamKind::Text:
+            return std::string(def.def_s.data());
+        case ParamKind::File:
+            return FileAsset(def.def_s, def.asset_type);
     }
     return 0;
 }
 
 std::vector<ParamValue> ParamBlock2::InitialValues(const ParamDef& def) const {
-    return std::vector<ParamValue>(IsTable(def) ? static_cast<std::size_t>(def.tab_size) : 1u, DefaultValue(def));
+    return std::vector<ParamValue>(IsTable(def) ? static_cast<std::size_t>(def.tab_size) : 1u,
+                                   DefaultValue(def));
 }
 
 ParamValue* ParamBlock2::Find(ParamID id, int tabIndex, std::initializer_list<ParamKind> kinds) {
@@ -87,7 +112,8 @@ ParamValue* ParamBlock2::Find(ParamID id, int tabIndex, std::initializer_list<Pa
     const ParamDef& def = desc_->paramdef(index);
     if (std::find(kinds.begin(), kinds.end(), KindOf(def)) == kinds.end()) return nullptr;
     std::vector<ParamValue>& values = values_[static_cast<std::size_t>(index)];
-    if (tabIndex < 0 || static_cast<std::size_t>(tabIndex) >= values.size() || (!IsTable(def) && tabIndex != 0))
+    if (tabIndex < 0 || static_cast<std::size_t>(tabIndex) >= values.size() ||
+        (!IsTable(def) && tabIndex != 0))
         return nullptr;
     return &values[static_cast<std::size_t>(tabIndex)];
 }
@@ -194,7 +220,7 @@ BOOL ParamBlock2::GetValue(ParamID id, TimeValue, const MCHAR*& v, Interval&, in
     const ParamValue* value = Find(id, tabIndex, {ParamKind::Text, ParamKind::File});
     if (value == nullptr) return FALSE;
     v = std::holds_alternative<std::string>(*value) ? std::get<std::string>(*value).c_str()
-                                                      : std::get<AssetUser>(*value).GetFileName().data();
+                                                    : std::get<AssetUser>(*value).GetFileName().data();
     return TRUE;
 }
 
@@ -213,13 +239,15 @@ int ParamBlock2::Count(ParamID id) {
 int ParamBlock2::SetCount(ParamID id, int n) {
     const int index = desc_->IDtoIndex(id);
     if (index < 0 || !IsTable(desc_->paramdef(index)) || n < 0 || n > kMaxTableCount) return Count(id);
-    values_[static_cast<std::size_t>(index)].resize(static_cast<std::size_t>(n), DefaultValue(desc_->paramdef(index)));
+    values_[static_cast<std::size_t>(index)].resize(static_cast<std::size_t>(n),
+                                                    DefaultValue(desc_->paramdef(index)));
     Changed(id);
     return n;
 }
 
 void ParamBlock2::ResetAll(BOOL, BOOL) {
-    for (int i = 0; i < desc_->Count(); ++i) values_[static_cast<std::size_t>(i)] = InitialValues(desc_->paramdef(i));
+    for (int i = 0; i < desc_->Count(); ++i)
+        values_[static_cast<std::size_t>(i)] = InitialValues(desc_->paramdef(i));
     // One message for the lot: -1 says every parameter changed.
     Changed(-1);
 }
@@ -231,7 +259,8 @@ void ParamBlock2::Reset(ParamID id, int tabIndex, BOOL, BOOL) {
     std::vector<ParamValue>& values = values_[static_cast<std::size_t>(index)];
     if (tabIndex == -1)
         values = InitialValues(def);
-    else if (tabIndex >= 0 && static_cast<std::size_t>(tabIndex) < values.size() && (IsTable(def) || tabIndex == 0))
+    else if (tabIndex >= 0 && static_cast<std::size_t>(tabIndex) < values.size() &&
+             (IsTable(def) || tabIndex == 0))
         values[static_cast<std::size_t>(tabIndex)] = DefaultValue(def);
     else
         return;
@@ -253,7 +282,8 @@ bool ParamBlock2::Restore(ParamID id, std::vector<ParamValue> values) {
     const int index = desc_->IDtoIndex(id);
     if (index < 0) return false;
     const ParamDef& def = desc_->paramdef(index);
-    const bool countFits = IsTable(def) ? values.size() <= static_cast<std::size_t>(kMaxTableCount) : values.size() == 1;
+    const bool countFits =
+        IsTable(def) ? values.size() <= static_cast<std::size_t>(kMaxTableCount) : values.size() == 1;
     const std::size_t alternative = Alternative(KindOf(def));
     if (!countFits || std::any_of(values.begin(), values.end(),
                                   [&](const ParamValue& value) { return value.index() != alternative; }))

@@ -60,7 +60,8 @@ ParamBlockDesc2::ParamBlockDesc2(BlockID id, const MCHAR* int_name, StringResID 
         def.int_name = va_arg(args, const MCHAR*);
         def.type = static_cast<ParamType2>(va_arg(args, int));
         Pigmo::Host::ParamKind kind;
-        if (!Pigmo::Host::KindOf(def.type, kind)) Refuse(*this, Named(def) + ": unknown type " + Hex(def.type));
+        if (!Pigmo::Host::KindOf(def.type, kind))
+            Refuse(*this, Named(def) + ": unknown type " + Hex(def.type));
         if ((def.type & TYPE_TAB) != 0) {
             def.tab_size = va_arg(args, int);
             if (def.tab_size < 0 || def.tab_size > Pigmo::Host::kMaxTableCount)
@@ -73,8 +74,12 @@ ParamBlockDesc2::ParamBlockDesc2(BlockID id, const MCHAR* int_name, StringResID 
                 case p_default:
                     // Each type is passed as C passes it through "...": floats as double.
                     switch (kind) {
-                        case Pigmo::Host::ParamKind::Int: def.def_i = va_arg(args, int); break;
-                        case Pigmo::Host::ParamKind::Float: def.def_f = static_cast<float>(va_arg(args, double)); break;
+                        case Pigmo::Host::ParamKind::Int:
+                            def.def_i = va_arg(args, int);
+                            break;
+                        case Pigmo::Host::ParamKind::Float:
+                            def.def_f = static_cast<float>(va_arg(args, double));
+                            break;
                         case Pigmo::Host::ParamKind::Vector: {
                             const Floats3 v = va_arg(args, Floats3);
                             def.def_c = AColor(v.x, v.y, v.z, 0.0f);
@@ -86,7 +91,9 @@ ParamBlockDesc2::ParamBlockDesc2(BlockID id, const MCHAR* int_name, StringResID 
                             break;
                         }
                         case Pigmo::Host::ParamKind::Text:
-                        case Pigmo::Host::ParamKind::File: def.def_s = va_arg(args, const MCHAR*); break;
+                        case Pigmo::Host::ParamKind::File:
+                            def.def_s = va_arg(args, const MCHAR*);
+                            break;
                     }
                     break;
                 case p_ui:
@@ -96,11 +103,20 @@ ParamBlockDesc2::ParamBlockDesc2(BlockID id, const MCHAR* int_name, StringResID 
                                           " is not supported");
                     def.ctrl_id = va_arg(args, int);
                     break;
-                case p_caption: def.caption = va_arg(args, StringResID); break;
-                case p_init_file: def.init_file = va_arg(args, const MCHAR*); break;
-                case p_file_types: def.file_types = va_arg(args, StringResID); break;
-                case p_assetTypeID: def.asset_type = va_arg(args, int); break;
-                default: Refuse(*this, Named(def) + ": unknown tag " + Hex(tag));
+                case p_caption:
+                    def.caption = va_arg(args, StringResID);
+                    break;
+                case p_init_file:
+                    def.init_file = va_arg(args, const MCHAR*);
+                    break;
+                case p_file_types:
+                    def.file_types = va_arg(args, StringResID);
+                    break;
+                case p_assetTypeID:
+                    def.asset_type = va_arg(args, int);
+                    break;
+                default:
+                    Refuse(*this, Named(def) + ": unknown tag " + Hex(tag));
             }
         }
         if (IDtoIndex(def.ID) >= 0) Refuse(*this, Named(def) + ": the id is taken");
@@ -133,4 +149,5 @@ ParamDef& ParamBlockDesc2::GetParamDef(ParamID id) {
 
 void ParamBlockDesc2::SetUserDlgProc(ParamMap2UserDlgProc* proc) {
     dlgProc_ = proc;
+    if (map_ != nullptr) map_->SetUserDlgProc(proc);
 }

@@ -89,7 +89,14 @@ RefResult ReferenceTarget::NotifyDependents(Interval changeInterval, PartID part
         // One told before may have dropped or deleted another.
         if (std::find(dependents_.begin(), dependents_.end(), maker) == dependents_.end()) continue;
         PartID changed = part;
-        maker->NotifyRefChanged(changeInterval, this, changed, message);
+        const RefResult result = maker->NotifyRefChanged(changeInterval, this, changed, message);
+        // As in the host, a change travels on to whatever references the maker, unless the maker
+        // stops it (or has gone meanwhile).
+        if (result == REF_STOP ||
+            std::find(dependents_.begin(), dependents_.end(), maker) == dependents_.end())
+            continue;
+        if (auto* target = dynamic_cast<ReferenceTarget*>(maker))
+            target->NotifyDependents(changeInterval, changed, message);
     }
     return REF_SUCCEED;
 }

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 #include <pigmo/bp.h>
 
+#include <cmath>
 #include <memory>
 #include <vector>
 
@@ -114,5 +115,24 @@ TEST(Record, TagsAndCopiesAreOwned) {
         EXPECT_EQ(std::vector<float>(record->GetLab(), record->GetLab() + 3), lab);
     }
 }
+
+struct HtmlCase {
+    double red, green, blue;
+    const char* code;
+};
+
+class HtmlCode : public testing::TestWithParam<HtmlCase> {};
+
+// Truncated, red first, clamped; a round trip's error below a hundredth does not drop a level.
+TEST_P(HtmlCode, IsTheTruncatedTripleRedFirst) {
+    const HtmlCase& c = GetParam();
+    EXPECT_EQ(Pigmo::HtmlColorCode(c.red, c.green, c.blue), c.code);
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, HtmlCode,
+                         testing::Values(HtmlCase{254.6, 0.4, 128.6, "#FE0080"},
+                                         HtmlCase{219.999235, 39.995777, 30.000668, "#DC281E"},
+                                         HtmlCase{219.98, 1.5, 16.0, "#DB0110"},
+                                         HtmlCase{-5.0, 300.0, std::nan(""), "#00FF00"}));
 
 }  // namespace

@@ -14,6 +14,24 @@ public:
     SClass_ID SuperClassID() override { return TEXMAP_CLASS_ID; }
     Class_ID ClassID() override { return kClassID; }
     const MCHAR* Category() override { return "Tests"; }
+    HINSTANCE HInstance() override { return Module(); }
+};
+
+class RecordingDlgProc final : public ParamMap2UserDlgProc {
+public:
+    INT_PTR DlgProc(TimeValue, IParamMap2* map, HWND hWnd, UINT msg, WPARAM wParam, LPARAM) override {
+        // The procedure is told of its own rollout.
+        const std::string which = map != nullptr && map->GetHWnd() == hWnd ? "" : " (another window)";
+        if (msg == WM_INITDIALOG) DialogLog().push_back("init" + which);
+        if (msg == WM_DESTROY) DialogLog().push_back("destroy" + which);
+        if (msg == WM_COMMAND) DialogLog().push_back("command " + std::to_string(LOWORD(wParam)) + which);
+        return FALSE;
+    }
+    void DeleteThis() override {
+        DialogLog().push_back("deleted");
+        delete this;
+    }
+    void SetThing(ReferenceTarget*) override { DialogLog().push_back("thing"); }
 };
 
 class Callback final : public PostLoadCallback {
@@ -60,6 +78,12 @@ RefTargetHandle Map::Clone(RemapDir& remap) {
     clone->ReplaceReference(0, remap.CloneRef(block_));
     BaseClone(this, clone, remap);
     return clone;
+}
+
+ParamDlg* Map::CreateParamDlg(HWND hwMtlEdit, IMtlParams* imp) {
+    IAutoMParamDlg* dialogs = cd_->CreateParamDlgs(hwMtlEdit, imp, this);
+    if (dialogs != nullptr) cd_->GetParamBlockDesc(0)->SetUserDlgProc(new RecordingDlgProc);
+    return dialogs;
 }
 
 IOResult Map::Load(ILoad* iload) {
@@ -125,7 +149,9 @@ std::string Describe(IParamBlock2& block) {
                     text += ' ';
                     text += std::to_string(block.GetInt(id, 0, entry));
                     break;
-                case TYPE_FLOAT: add(block.GetFloat(id, 0, entry)); break;
+                case TYPE_FLOAT:
+                    add(block.GetFloat(id, 0, entry));
+                    break;
                 case TYPE_POINT3:
                 case TYPE_RGBA: {
                     const Point3 p = block.GetPoint3(id, 0, entry);
@@ -138,12 +164,24 @@ std::string Describe(IParamBlock2& block) {
                     for (float v : {c.r, c.g, c.b, c.a}) add(v);
                     break;
                 }
-                default: text += " \"" + std::string(block.GetStr(id, 0, entry)) + "\""; break;
+                default:
+                    text += " \"" + std::string(block.GetStr(id, 0, entry)) + "\"";
+                    break;
             }
         }
         text += "\n";
     }
     return text;
+}
+
+HINSTANCE Module() {
+    // Any address of the module tells it apart.
+    return reinterpret_cast<HINSTANCE>(&LiveMaps);
+}
+
+std::vector<std::string>& DialogLog() {
+    static std::vector<std::string> log;
+    return log;
 }
 
 int& LiveMaps() {

@@ -42,6 +42,8 @@ public:
     AColor EvalColor(ShadeContext& sc) override;
     Point3 EvalNormalPerturb(ShadeContext&) override { return Point3(0.0f, 0.0f, 1.0f); }
     RefTargetHandle Clone(RemapDir& remap) override;
+    // The rollout, with a procedure that writes what it is told in DialogLog().
+    ParamDlg* CreateParamDlg(HWND hwMtlEdit, IMtlParams* imp) override;
     // Also registers a post-load callback whose priority is the map's G-buffer id.
     IOResult Load(ILoad* iload) override;
 
@@ -59,8 +61,13 @@ private:
     IParamBlock2* block_ = nullptr;
 };
 
-// The descriptor, with its parameter block description.
+// The descriptor, with its parameter block description. Its instance handle is Module().
 ClassDesc2& Class();
+HINSTANCE Module();
+
+// What the user dialog procedures of fake rollouts were told, in order: "init", "destroy",
+// "command ID", "thing" for another map, and "deleted" when the host deleted one.
+std::vector<std::string>& DialogLog();
 
 // Fake maps alive in this module.
 int& LiveMaps();

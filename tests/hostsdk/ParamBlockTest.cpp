@@ -15,7 +15,8 @@ using MaxSDK::AssetManagement::AssetUser;
 using MaxSDK::AssetManagement::kInvalidId;
 
 const std::string kDefaults =
-    "0: \"\"\n1: 7\n2: \"none\"\n3: 1 2 3\n4: 0.5\n5: 0.25 0.5 0.75 1\n6: 0.25 0.25\n7:\n12: 0.125 0.5 1\n9: 1\n";
+    "0: \"\"\n1: 7\n2: \"none\"\n3: 1 2 3\n4: 0.5\n5: 0.25 0.5 0.75 1\n6: 0.25 0.25\n7:\n12: 0.125 0.5 1\n9: "
+    "1\n";
 
 class Block : public testing::Test {
 protected:
@@ -82,27 +83,42 @@ INSTANTIATE_TEST_SUITE_P(
         WriteCase{"IntoInt", Fake::kCount, [](B& b) { return b.SetValue(Fake::kCount, 0, 9); }, true},
         WriteCase{"IntoBool", Fake::kEnabled, [](B& b) { return b.SetValue(Fake::kEnabled, 0, 0); }, true},
         WriteCase{"IntIntoFloat", Fake::kWeight, [](B& b) { return b.SetValue(Fake::kWeight, 0, 2); }, false},
-        WriteCase{"FloatIntoInt", Fake::kCount, [](B& b) { return b.SetValue(Fake::kCount, 0, 2.5f); }, false},
-        WriteCase{"NaN", Fake::kWeight, [](B& b) { return b.SetValue(Fake::kWeight, 0, std::nanf("")); }, false},
-        WriteCase{"Point3IntoRgb", Fake::kShade, [](B& b) { return b.SetValue(Fake::kShade, 0, Point3(0.0f, 0.0f, 0.0f)); }, true},
-        WriteCase{"ColorIntoPoint3", Fake::kPosition, [](B& b) { return b.SetValue(Fake::kPosition, 0, Color(7, 8, 9)); }, true},
+        WriteCase{"FloatIntoInt", Fake::kCount, [](B& b) { return b.SetValue(Fake::kCount, 0, 2.5f); },
+                  false},
+        WriteCase{"NaN", Fake::kWeight, [](B& b) { return b.SetValue(Fake::kWeight, 0, std::nanf("")); },
+                  false},
+        WriteCase{"Point3IntoRgb", Fake::kShade,
+                  [](B& b) { return b.SetValue(Fake::kShade, 0, Point3(0.0f, 0.0f, 0.0f)); }, true},
+        WriteCase{"ColorIntoPoint3", Fake::kPosition,
+                  [](B& b) { return b.SetValue(Fake::kPosition, 0, Color(7, 8, 9)); }, true},
         WriteCase{"InfinityIntoPoint3", Fake::kPosition,
                   [](B& b) { return b.SetValue(Fake::kPosition, 0, Point3(1.0f, HUGE_VALF, 0.0f)); }, false},
-        WriteCase{"AColorIntoPoint3", Fake::kPosition, [](B& b) { return b.SetValue(Fake::kPosition, 0, AColor(1, 1, 1)); }, false},
-        WriteCase{"AColorIntoFrgba", Fake::kTint, [](B& b) { return b.SetValue(Fake::kTint, 0, AColor(1, 0, 0, 0.5f)); }, true},
-        WriteCase{"Point3IntoFrgba", Fake::kTint, [](B& b) { return b.SetValue(Fake::kTint, 0, Point3(1.0f, 0.0f, 0.0f)); }, false},
-        WriteCase{"TextIntoFilename", Fake::kFile, [](B& b) { return b.SetValue(Fake::kFile, 0, "/a.cxf"); }, true},
+        WriteCase{"AColorIntoPoint3", Fake::kPosition,
+                  [](B& b) { return b.SetValue(Fake::kPosition, 0, AColor(1, 1, 1)); }, false},
+        WriteCase{"AColorIntoFrgba", Fake::kTint,
+                  [](B& b) { return b.SetValue(Fake::kTint, 0, AColor(1, 0, 0, 0.5f)); }, true},
+        WriteCase{"Point3IntoFrgba", Fake::kTint,
+                  [](B& b) { return b.SetValue(Fake::kTint, 0, Point3(1.0f, 0.0f, 0.0f)); }, false},
+        WriteCase{"TextIntoFilename", Fake::kFile, [](B& b) { return b.SetValue(Fake::kFile, 0, "/a.cxf"); },
+                  true},
         WriteCase{"TextIntoInt", Fake::kCount, [](B& b) { return b.SetValue(Fake::kCount, 0, "3"); }, false},
-        WriteCase{"AssetIntoFilename", Fake::kFile, [](B& b) { return b.SetValue(Fake::kFile, 0, kAsset); }, true},
-        WriteCase{"AssetIntoString", Fake::kLabel, [](B& b) { return b.SetValue(Fake::kLabel, 0, kAsset); }, false},
+        WriteCase{"AssetIntoFilename", Fake::kFile, [](B& b) { return b.SetValue(Fake::kFile, 0, kAsset); },
+                  true},
+        WriteCase{"AssetIntoString", Fake::kLabel, [](B& b) { return b.SetValue(Fake::kLabel, 0, kAsset); },
+                  false},
         WriteCase{"UnknownId", 99, [](B& b) { return b.SetValue(99, 0, 1); }, false},
         WriteCase{"SecondOfOne", Fake::kCount, [](B& b) { return b.SetValue(Fake::kCount, 0, 9, 1); }, false},
-        WriteCase{"TableEntry", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, 1); }, true},
-        WriteCase{"PastTheTable", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, 2); }, false},
-        WriteCase{"BeforeTheTable", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, -1); }, false},
+        WriteCase{"TableEntry", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, 1); },
+                  true},
+        WriteCase{"PastTheTable", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, 2); },
+                  false},
+        WriteCase{"BeforeTheTable", Fake::kCurve, [](B& b) { return b.SetValue(Fake::kCurve, 0, 0.75f, -1); },
+                  false},
         WriteCase{"GrowTable", Fake::kTags, [](B& b) { return b.SetCount(Fake::kTags, 2) == 2; }, true},
-        WriteCase{"NegativeCount", Fake::kCurve, [](B& b) { return b.SetCount(Fake::kCurve, -1) == -1; }, false},
-        WriteCase{"HugeCount", Fake::kCurve, [](B& b) { return b.SetCount(Fake::kCurve, 1 << 20) == 1 << 20; }, false},
+        WriteCase{"NegativeCount", Fake::kCurve, [](B& b) { return b.SetCount(Fake::kCurve, -1) == -1; },
+                  false},
+        WriteCase{"HugeCount", Fake::kCurve,
+                  [](B& b) { return b.SetCount(Fake::kCurve, 1 << 20) == 1 << 20; }, false},
         WriteCase{"CountOfOne", Fake::kCount, [](B& b) { return b.SetCount(Fake::kCount, 3) == 3; }, false}),
     [](const testing::TestParamInfo<WriteCase>& info) { return info.param.name; });
 
@@ -178,19 +194,6 @@ TEST_F(Block, CloneHasTheValuesAndGoesItsOwnWay) {
     EXPECT_EQ(clone->changes, std::vector<ParamID>{Fake::kCount});
     EXPECT_TRUE(map_->changes.empty());
     clone->DeleteThis();
-}
-
-TEST_F(Block, ParameterDialogsFollowTheEditedObject) {
-    IAutoMParamDlg* dialog = Fake::Class().CreateParamDlgs(nullptr, nullptr, map_);
-    ASSERT_NE(dialog, nullptr);
-    EXPECT_EQ(dialog->ClassID(), Fake::kClassID);
-    EXPECT_EQ(dialog->GetMap(0)->GetHWnd(), nullptr);
-    EXPECT_EQ(dialog->GetMap(0)->GetParamBlock(), block_);
-    auto* other = static_cast<Fake::Map*>(static_cast<Texmap*>(Fake::Class().Create(FALSE)));
-    dialog->SetThing(other);
-    EXPECT_EQ(dialog->GetMap(0)->GetParamBlock(), other->GetParamBlock(0));
-    dialog->DeleteThis();
-    other->DeleteThis();
 }
 
 }  // namespace

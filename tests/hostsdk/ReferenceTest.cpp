@@ -20,13 +20,16 @@ public:
         return new Target(name + " copy");
     }
     void EnumAuxFiles(MaxSDK::AssetManagement::AssetEnumCallback& callback, DWORD) override {
-        callback.RecordAsset(MaxSDK::AssetManagement::AssetUser({}, MaxSDK::AssetManagement::kOtherAsset, name.c_str()));
+        callback.RecordAsset(
+            MaxSDK::AssetManagement::AssetUser({}, MaxSDK::AssetManagement::kOtherAsset, name.c_str()));
     }
     std::string name;
     int clones = 0;
 
 private:
-    RefResult NotifyRefChanged(Interval, RefTargetHandle, PartID&, RefMessage) override { return REF_SUCCEED; }
+    RefResult NotifyRefChanged(Interval, RefTargetHandle, PartID&, RefMessage) override {
+        return REF_SUCCEED;
+    }
 };
 
 // A maker that remembers what it references and what it was told; it may delete another maker
@@ -111,9 +114,39 @@ TEST(References, ChangesReachEveryDependentStillThere) {
     last.DeleteAllRefsFromMe();
 }
 
+// A target that references another and answers its changes as told.
+class Relay final : public ReferenceTarget {
+public:
+    explicit Relay(RefResult answer) : answer_(answer) {}
+
+private:
+    RefResult NotifyRefChanged(Interval, RefTargetHandle, PartID&, RefMessage) override { return answer_; }
+    RefResult answer_;
+};
+
+class ChangeTravel : public testing::TestWithParam<std::pair<RefResult, int>> {};
+
+TEST_P(ChangeTravel, OnToWhatReferencesTheMakerUnlessItStopsIt) {
+    Target source("s");
+    Relay relay(GetParam().first);
+    relay.ReplaceReference(0, &source);
+    Watcher watcher;
+    watcher.ReplaceReference(0, &relay);
+    source.NotifyDependents(FOREVER, PART_ALL, REFMSG_CHANGE);
+    EXPECT_EQ(watcher.messages, GetParam().second);
+    watcher.DeleteAllRefsFromMe();
+    relay.DeleteAllRefsFromMe();
+}
+
+INSTANTIATE_TEST_SUITE_P(Answers, ChangeTravel,
+                         testing::Values(std::pair{REF_SUCCEED, 1}, std::pair{REF_DONTCARE, 1},
+                                         std::pair{REF_STOP, 0}));
+
 class Files final : public MaxSDK::AssetManagement::AssetEnumCallback {
 public:
-    void RecordAsset(const MaxSDK::AssetManagement::AssetUser& asset) override { names.emplace_back(asset.GetFileName()); }
+    void RecordAsset(const MaxSDK::AssetManagement::AssetUser& asset) override {
+        names.emplace_back(asset.GetFileName());
+    }
     std::vector<std::string> names;
 };
 
