@@ -13,6 +13,7 @@
 #include "Output.h"
 #include "PaletteDiscovery.h"
 #include "Paths.h"
+#include "Progress.h"
 #include "Settings.h"
 #include "ValueLines.h"
 
@@ -81,9 +82,11 @@ private:
 // Prints each color as the reader hands it over, so a book of any size lists in little memory.
 class BookPrinter final : public Pigmo::ColorBookVisitor {
 public:
-    BookPrinter(std::string path, bool json) : path_(std::move(path)), json_(json) {}
+    BookPrinter(std::string path, bool json)
+        : path_(std::move(path)), json_(json), progress_(std::make_unique<Progress>("book")) {}
 
     void Begin(const std::string& palette, std::size_t colorCount) override {
+        count_ = colorCount;
         if (json_) {
             WriteOut("{\n  \"file\": " + JsonString(path_) + ",\n  \"palette\": " + JsonString(palette) +
                      ",\n  \"colors\": [");
@@ -96,21 +99,21 @@ public:
 
     void Color(const Pigmo::ColorInformation& color, const std::vector<double>& wavelengths) override {
         ++index_;
+        progress_->Update(
+            [this] { return "color " + std::to_string(index_) + " of " + std::to_string(count_); });
         curves_.Check(color, wavelengths);
         WriteOut(json_ ? JsonColor(color) : TextColor(color));
     }
 
     void End() {
+        progress_.reset();  // before the warnings
         if (json_) WriteOut(index_ == 0 ? "]\n}\n" : "\n  ]\n}\n");
         curves_.Report();
     }
 
 private:
     // Names come from the file as bytes; invalid UTF-8 is replaced rather than failing the listing.
-    static std::string Dump(const nlohmann::ordered_json& value) {
-        return value.dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
-    }
-    static std::string JsonString(const std::string& text) { return Dump(nlohmann::ordered_json(text)); }
+    static std::string JsonString(const std::string& text) { return JsonText(nlohmann::ordered_json(text)); }
 
     std::string JsonColor(const Pigmo::ColorInformation& color) const {
         std::vector<std::string> tags;
@@ -125,7 +128,7 @@ private:
             {"linear_rgb", Triple(color.GetLinearRGB())},
             {"tags", tags},
             {"reflectance", std::vector<double>(curve, curve + color.GetSpectralReflectanceCount())}};
-        return (index_ == 1 ? "\n    " : ",\n    ") + Dump(record);
+        return (index_ == 1 ? "\n    " : ",\n    ") + JsonText(record);
     }
 
     std::string TextColor(const Pigmo::ColorInformation& color) const {
@@ -145,7 +148,9 @@ private:
     std::string path_;
     bool json_;
     std::size_t index_ = 0;
+    std::size_t count_ = 0;
     CurveCheck curves_;
+    std::unique_ptr<Progress> progress_;
 };
 
 void RunBook(const BookArguments& arguments) {

@@ -19,6 +19,7 @@ struct DeltaEArguments {
     std::string metric = "ciede2000";
     std::string weights;  // comma-separated
     std::vector<std::string> values;
+    bool json = false;
 };
 
 struct Metric {
@@ -64,7 +65,7 @@ std::vector<double> Weights(const std::string& text) {
 
 class PairPrinter {
 public:
-    explicit PairPrinter(const DeltaEArguments& arguments) {
+    explicit PairPrinter(const DeltaEArguments& arguments) : name_(arguments.metric), json_(arguments.json) {
         const auto found = Metrics().find(arguments.metric);
         if (found == Metrics().end()) {
             throw std::invalid_argument("unknown metric '" + arguments.metric + "' (one of " + MetricNames() +
@@ -91,10 +92,20 @@ public:
         for (size_t i = 0; i < 6; ++i) lab[i] = ParseNumber(values[i]);
         const double difference = metric_->difference(lab, lab + 3, weights_);
         RequireFinite(&difference, 1);
-        std::printf("%.10g\n", difference);
+        if (json_) {
+            const nlohmann::ordered_json record = {{"metric", name_},
+                                                   {"reference", {lab[0], lab[1], lab[2]}},
+                                                   {"sample", {lab[3], lab[4], lab[5]}},
+                                                   {"difference", difference}};
+            WriteOut(JsonText(record) + "\n");
+        } else {
+            std::printf("%.10g\n", difference);
+        }
     }
 
 private:
+    std::string name_;
+    bool json_;
     const Metric* metric_ = nullptr;
     std::vector<double> weights_;
 };
@@ -102,7 +113,7 @@ private:
 int RunDeltaE(const DeltaEArguments& arguments) {
     return RunCommand("delta-e", [&] {
         const PairPrinter printer(arguments);
-        ForEachValueLine(arguments.values,
+        ForEachValueLine("delta-e", arguments.values,
                          [&](const std::vector<std::string>& values) { printer.Print(values); });
     });
 }
@@ -119,6 +130,8 @@ void AddDeltaECommand(CLI::App& app, int& exitCode) {
     command->add_option("VALUES", arguments->values,
                         "L a b of the reference, then L a b of the sample; without them, one pair of six "
                         "numbers per line is read from standard input");
+    command->add_flag("--json", arguments->json,
+                      "print each difference as a JSON object with the metric and the two colors");
     command->footer(
         "CMC and CIE94 weight by the reference, so the order of the two colors matters. Each difference is "
         "printed on one line with 10 significant digits.\n"

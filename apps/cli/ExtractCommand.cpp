@@ -15,6 +15,7 @@
 #include "ColorInformation.h"
 #include "Commands.h"
 #include "Output.h"
+#include "Progress.h"
 #include "RegularFile.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
@@ -139,8 +140,16 @@ void PrintText(const std::vector<DominantColor>& colors) {
 
 void RunExtract(const ExtractArguments& arguments) {
     const int count = ParseCount(arguments.count);
-    DecodedImage image = Load(arguments.image, arguments.maxPixels);
-    const std::vector<DominantColor> colors = Dominant(image, count);
+    std::vector<DominantColor> colors;
+    DecodedImage image;
+    {
+        Progress progress("extract");
+        progress.Set("decoding " + arguments.image);
+        image = Load(arguments.image, arguments.maxPixels);
+        progress.Set("finding the dominant colors of " + std::to_string(image.width) + " x " +
+                     std::to_string(image.height) + " pixels");
+        colors = Dominant(image, count);
+    }
     if (arguments.json) {
         PrintJson(arguments, image, colors);
     } else {

@@ -16,6 +16,7 @@ namespace {
 struct HarmonyArguments {
     std::string kind;
     std::vector<std::string> lab;
+    bool json = false;
 };
 
 using PairHarmony = int (*)(const double*, double*, double*);
@@ -46,6 +47,15 @@ void RunHarmony(const HarmonyArguments& arguments) {
     }
     if (status != 1) throw std::runtime_error("the color could not be converted");
     RequireFinite(out[0], 3 * static_cast<size_t>(count));
+    if (arguments.json) {
+        nlohmann::ordered_json companions = nlohmann::ordered_json::array();
+        for (int i = 0; i < count; ++i) companions.push_back({out[i][0], out[i][1], out[i][2]});
+        WriteOut(
+            JsonText(
+                {{"kind", arguments.kind}, {"color", {lab[0], lab[1], lab[2]}}, {"companions", companions}}) +
+            "\n");
+        return;
+    }
     for (int i = 0; i < count; ++i) std::printf("%.10g %.10g %.10g\n", out[i][0], out[i][1], out[i][2]);
 }
 
@@ -57,6 +67,7 @@ void AddHarmonyCommand(CLI::App& app, int& exitCode) {
     command->add_option("KIND", arguments->kind, "monochromatic, near, far, triadic or complement")
         ->required();
     command->add_option("LAB", arguments->lab, "L a b of the color")->required();
+    command->add_flag("--json", arguments->json, "print the color and its companions as a JSON object");
     command->footer(
         "Hues turn on a twelve-sector painter's wheel: near by 30 degrees, triadic by 120, far by 150 (each "
         "both ways, printed minus first), complement by 180; monochromatic changes lightness only. Each"

@@ -87,3 +87,7 @@ void WriteOut(std::string_view text) {
     if (std::fwrite(text.data(), 1, text.size(), stdout) != text.size())
         throw std::runtime_error("cannot write the output");
 }
+
+std::string JsonText(const nlohmann::ordered_json& value) {
+    return value.dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
+}

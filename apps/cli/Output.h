@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <nlohmann/json.hpp>
 #include <string>
 #include <string_view>
 
@@ -14,6 +15,9 @@ std::string Printable(std::string_view text);
 
 // Throws std::runtime_error naming the values when one of them is not a finite number.
 void RequireFinite(const double* values, std::size_t count);
+
+// One line of JSON; text that is not UTF-8 shows as U+FFFD and control characters as escapes.
+std::string JsonText(const nlohmann::ordered_json& value);
 
 // Writes text to standard output; throws when it cannot be written.
 void WriteOut(std::string_view text);

@@ -100,7 +100,7 @@ private:
 int RunTranslate(const TranslateArguments& arguments) {
     return RunCommand("translate", [&] {
         ColorLineConverter converter(arguments);
-        ForEachValueLine(arguments.values,
+        ForEachValueLine("translate", arguments.values,
                          [&](const std::vector<std::string>& values) { converter.Convert(values); });
     });
 }

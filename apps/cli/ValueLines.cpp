@@ -5,6 +5,7 @@
 #include <stdexcept>
 
 #include "Output.h"
+#include "Progress.h"
 
 namespace {
 
@@ -56,14 +57,16 @@ int RunCommand(const std::string& command, const std::function<void()>& work) {
     return 1;
 }
 
-void ForEachValueLine(const std::vector<std::string>& values,
+void ForEachValueLine(const std::string& command, const std::vector<std::string>& values,
                       const std::function<void(const std::vector<std::string>&)>& handle) {
     if (!values.empty()) {
         handle(values);
         return;
     }
+    Progress progress(command);
     std::string line;
     for (int number = 1;; ++number) {
+        progress.Update([number] { return "line " + std::to_string(number); });
         try {
             if (!ReadLine(line)) break;
             if (number == 1 && line.starts_with("\xEF\xBB\xBF")) line.erase(0, 3);

@@ -18,6 +18,6 @@ inline constexpr std::size_t kMaxLineBytes = std::size_t{1} << 20;
 
 // Runs handle on the values given on the command line or, when there are none, on each non-blank
 // line of standard input (a UTF-8 byte-order mark before the first is skipped); an error on a line of
-// standard input is rethrown with its line number.
-void ForEachValueLine(const std::vector<std::string>& values,
+// standard input is rethrown with its line number. A long input shows its progress.
+void ForEachValueLine(const std::string& command, const std::vector<std::string>& values,
                       const std::function<void(const std::vector<std::string>&)>& handle);

@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "CommandLine.h"
 #include "Commands.h"
 #include "Output.h"
 
@@ -23,14 +24,15 @@ std::vector<std::string> Arguments(int argc, char** argv) {
 }
 
 int Run(int argc, char** argv) {
-    CLI::App app{"pigmo: color conversions, color differences, ISCC-NBS names, harmonies, color books and the Color Map"};
-    app.name("pigmo");
+    CLI::App app{
+        "pigmo: color conversions, color differences, ISCC-NBS names, harmonies, color books and the Color "
+        "Map"};
+    SetUpCommandLine(app, "pigmo");
     app.require_subcommand(1);
-    // One line per error; the hint to --help rides on the same line.
-    app.failure_message([](const CLI::App*, const CLI::Error& e) {
-        return "pigmo: " + Printable(e.what()) + " (see --help)\n";
-    });
-    int exitCode = 0;
+    app.footer(std::string(
+                   "Run 'pigmo SUBCOMMAND --help' for a subcommand's arguments, defaults and an example.\n") +
+               kExitStatusHelp);
+    int exitCode = kExitSuccess;
     AddTranslateCommand(app, exitCode);
     AddDeltaECommand(app, exitCode);
     AddHarmonyCommand(app, exitCode);
@@ -39,12 +41,8 @@ int Run(int argc, char** argv) {
     AddBookCommand(app, exitCode);
     AddPalettesCommand(app, exitCode);
     AddMapCommand(app, exitCode);
-    try {
-        std::vector<std::string> arguments = Arguments(argc, argv);
-        app.parse(arguments);
-    } catch (const CLI::ParseError& e) {
-        return app.exit(e);
-    }
+    std::vector<std::string> arguments = Arguments(argc, argv);
+    if (const std::optional<int> done = ParseCommandLine(app, arguments)) return *done;
     return exitCode;
 }
 
@@ -59,5 +57,5 @@ int main(int argc, char** argv) {
     } catch (const std::exception& e) {
         std::fprintf(stderr, "pigmo: %s\n", Printable(e.what()).c_str());
     }
-    return 1;
+    return kExitFailed;
 }

@@ -112,7 +112,7 @@ TEST_F(RolloutCommand, AFailingCommandWritesNoFile) {
     };
     for (const Case& c : cases) {
         const RunResult result = RunPigmo(c.arguments);
-        EXPECT_EQ(result.exitCode, c.arguments.find("--scale") != std::string::npos ? 105 : 1) << c.arguments;
+        EXPECT_EQ(result.exitCode, c.arguments.find("--scale") != std::string::npos ? 2 : 1) << c.arguments;
         EXPECT_NE(result.err.find(c.error), std::string::npos) << result.err;
         EXPECT_EQ(std::count(result.err.begin(), result.err.end(), '\n'), 1) << result.err;
         EXPECT_EQ(ReadWholeFile(Panel()), "kept");

@@ -1,0 +1,60 @@
+# Writes a man page from a program's own help: help2man for the page, and a section with the help of
+# every subcommand (and of their subcommands), so the page says what --help says.
+# Variables: PROGRAM, HELP2MAN, NAME (the one-line description), OUTPUT.
+
+# The subcommands a help text lists under "Subcommands:".
+function(list_subcommands help result)
+  set(names "")
+  set(inside FALSE)
+  string(REPLACE "\n" ";" lines "${help}")
+  foreach(line IN LISTS lines)
+    if(line STREQUAL "Subcommands:")
+      set(inside TRUE)
+    elseif(inside AND line MATCHES "^  ([a-z0-9-]+) ")
+      list(APPEND names "${CMAKE_MATCH_1}")
+    elseif(inside)
+      set(inside FALSE)
+    endif()
+  endforeach()
+  set(${result} "${names}" PARENT_SCOPE)
+endfunction()
+
+# roff text: backslashes escaped, no line starting with a control character.
+function(roff text result)
+  string(REPLACE "\\" "\\e" text "${text}")
+  string(REGEX REPLACE "(^|\n)([.'])" "\\1\\\\&\\2" text "${text}")
+  set(${result} "${text}" PARENT_SCOPE)
+endfunction()
+
+function(help_of arguments result)
+  execute_process(COMMAND "${PROGRAM}" ${arguments} --help OUTPUT_VARIABLE help RESULT_VARIABLE status)
+  if(NOT status EQUAL 0)
+    message(FATAL_ERROR "${PROGRAM} ${arguments} --help failed: ${status}")
+  endif()
+  set(${result} "${help}" PARENT_SCOPE)
+endfunction()
+
+help_of("" top)
+list_subcommands("${top}" commands)
+set(include "")
+if(commands)
+  set(include "[SUBCOMMANDS]\n")
+  foreach(command IN LISTS commands)
+    help_of("${command}" help)
+    roff("${help}" text)
+    string(APPEND include ".SS ${command}\n.nf\n${text}.fi\n")
+    list_subcommands("${help}" inner)
+    foreach(subcommand IN LISTS inner)
+      help_of("${command};${subcommand}" help)
+      roff("${help}" text)
+      string(APPEND include ".SS \"${command} ${subcommand}\"\n.nf\n${text}.fi\n")
+    endforeach()
+  endforeach()
+endif()
+file(WRITE "${OUTPUT}.include" "${include}")
+execute_process(COMMAND "${HELP2MAN}" --no-info --no-discard-stderr --name "${NAME}" --include "${OUTPUT}.include"
+                        --output "${OUTPUT}" "${PROGRAM}"
+                RESULT_VARIABLE status)
+if(NOT status EQUAL 0)
+  message(FATAL_ERROR "help2man failed for ${PROGRAM}")
+endif()
