@@ -51,9 +51,12 @@ if(commands)
     endforeach()
   endforeach()
 endif()
-file(WRITE "${OUTPUT}.include" "${include}")
-execute_process(COMMAND "${HELP2MAN}" --no-info --no-discard-stderr --name "${NAME}" --include "${OUTPUT}.include"
-                        --output "${OUTPUT}" "${PROGRAM}"
+set(options --no-info --no-discard-stderr --name "${NAME}" --output "${OUTPUT}")
+if(include)
+  file(WRITE "${OUTPUT}.include" "${include}")
+  list(APPEND options --include "${OUTPUT}.include")
+endif()
+execute_process(COMMAND "${HELP2MAN}" ${options} "${PROGRAM}"
                 RESULT_VARIABLE status)
 if(NOT status EQUAL 0)
   message(FATAL_ERROR "help2man failed for ${PROGRAM}")

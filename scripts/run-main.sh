@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
-# Installs what is missing, builds a Release copy, runs a few conversions, lists the default color book,
-# then puts a Color Map with the default book in a scene, picks a color and renders its preview.
+# Installs what is missing, builds a Release copy, lists the palettes and the default color book, then
+# puts a Color Map with the default book in a scene, picks a color, and renders its sample sphere and
+# its editor panel.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 bash scripts/install-deps.sh
@@ -10,12 +11,11 @@ pigmo=build/release/apps/cli/pigmo
 out=build/main-job
 mkdir -p "$out"
 set -x
-"$pigmo" translate lab srgb 100 0 0
-"$pigmo" translate srgb lab 255 255 255
-"$pigmo" translate lab lch 50 20 -30
 "$pigmo" palettes
-"$pigmo" book
+"$pigmo" book >"$out/book.txt"
+head -n 12 "$out/book.txt"
 "$pigmo" map new "$out/scene.json"
 "$pigmo" map pick "$out/scene.json" 5
 "$pigmo" map show "$out/scene.json"
 "$pigmo" map render "$out/scene.json" -o "$out/preview.png" --sphere
+"$pigmo" map rollout "$out/scene.json" -o "$out/panel.png"

@@ -20,3 +20,6 @@ cmake -S . -B build/sanitize -DCMAKE_BUILD_TYPE=Debug -DCMAKE_CXX_FLAGS_DEBUG="-
   -DPIGMO_SANITIZE=ON -DPIGMO_BUILD_BENCH=OFF
 cmake --build build/sanitize -j "$jobs"
 ctest --test-dir build/sanitize --output-on-failure -j "$jobs"
+
+# The Debian package: built from the Release build, installed, tried and removed again.
+bash scripts/deb-smoke.sh build/release

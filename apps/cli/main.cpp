@@ -41,6 +41,16 @@ int Run(int argc, char** argv) {
     AddBookCommand(app, exitCode);
     AddPalettesCommand(app, exitCode);
     AddMapCommand(app, exitCode);
+    // The parser would say only that a subcommand is required.
+    const auto known = [&app](const char* name) {
+        for (const CLI::App* command : app.get_subcommands({}))
+            if (command->check_name(name)) return true;
+        return false;
+    };
+    if (argc > 1 && argv[1][0] != '-' && !known(argv[1])) {
+        std::fprintf(stderr, "pigmo: unknown command '%s' (see --help)\n", Printable(argv[1]).c_str());
+        return kExitUsage;
+    }
     std::vector<std::string> arguments = Arguments(argc, argv);
     if (const std::optional<int> done = ParseCommandLine(app, arguments)) return *done;
     return exitCode;

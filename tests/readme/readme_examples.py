@@ -6,8 +6,9 @@ to the next command are its output. The commands of one block run in one shell, 
 ``cd`` and ``echo $?`` work as printed. A block fenced as ```<language> <file name>``` is written to
 that file first, so a program shown in the README can be built by the commands below it.
 
-Paths differ from machine to machine: the scratch prefix is shown as /usr and the scratch home as
-/home/you, as on a machine with the Debian package installed.
+Paths differ from machine to machine: the README shows them as on a machine with the Debian package
+installed, so /usr/share/pigmo in a command means the scratch prefix's data folder, and in the output
+the scratch prefix shows as /usr and the scratch home as /home/you.
 Usage: readme_examples.py README PREFIX
 """
 import os
@@ -73,9 +74,11 @@ def main():
             if name in os.environ:
                 env[name] = os.environ[name]
         for examples in blocks:
-            script = "exec 2>&1\n"
+            # The marker must not hide the last status from an "echo $?".
+            script = "exec 2>&1\nstatus=0\n"
             for n, (command, _) in enumerate(examples):
-                script += "printf '%s\\n' '" + MARK.format(n) + "'\n" + command + "\n"
+                command = command.replace("/usr/share/pigmo", os.path.join(prefix, "share", "pigmo"))
+                script += f"printf '%s\\n' '{MARK.format(n)}'\n(exit $status)\n{command}\nstatus=$?\n"
             run = subprocess.run(["bash", "-c", script], cwd=work, env=env, capture_output=True, text=True,
                                  errors="replace", timeout=600)
             output = run.stdout.replace(prefix, "/usr").replace(home, "/home/you")
