@@ -86,7 +86,7 @@ ColorSpaceStruct Plain(int32_t code) {
 }
 
 // An engine kept for the path; each path converts on its own.
-Compute Engine(ColorSpaceStruct source, ColorSpaceStruct destination, int32_t adaptation) {
+Compute Engine(ColorSpaceStruct source, ColorSpaceStruct destination, AdaptationMethod adaptation) {
     auto engine = std::make_shared<cColorTranslator>();
     engine->SetAdaptation(adaptation);
     engine->SetSource(source);
@@ -146,7 +146,7 @@ std::vector<Path> Conversions() {
             if (exported || from.code == to.code) continue;
             paths.push_back({std::string(from.name) + "->" + to.name, 3, 3, to.scale,
                              Inputs(seed, from.ranges, 80, *from.edges),
-                             Engine(Plain(from.code), Plain(to.code), 0)});
+                             Engine(Plain(from.code), Plain(to.code), AdaptationMethod::None)});
         }
     }
 
@@ -158,13 +158,13 @@ std::vector<Path> Conversions() {
     lchD65.whitePoint[0] = 0.95047;
     lchD65.whitePoint[2] = 1.08883;
     paths.push_back({"srgb->lab bradford", 3, 3, 1, Inputs(201, rgb, 80, kRgbEdges),
-                     Engine(srgb, Plain(3), 2)});
+                     Engine(srgb, Plain(3), AdaptationMethod::Bradford)});
     paths.push_back({"lab->srgb cat02", 3, 3, 1, Inputs(202, lab, 80, kLabEdges),
-                     Engine(Plain(3), srgb, 5)});
+                     Engine(Plain(3), srgb, AdaptationMethod::CAT02)});
     paths.push_back({"lab->linear-srgb xyz-scaling", 3, 3, 255, Inputs(203, lab, 80, kLabEdges),
-                     Engine(Plain(3), linear, 1)});
+                     Engine(Plain(3), linear, AdaptationMethod::XYZScaling)});
     paths.push_back({"lch-d65->lab", 3, 3, 1, Inputs(204, lch, 80, kLchEdges),
-                     Engine(lchD65, Plain(3), 0)});
+                     Engine(lchD65, Plain(3), AdaptationMethod::None)});
     return paths;
 }
 
@@ -184,9 +184,9 @@ std::vector<Path> AppearanceSpaces() {
                       : std::vector<Range>{lightness, {0, 70}, {0, 360}};
         const std::string name = "ciecam02 code " + std::to_string(code);
         paths.push_back({"xyz->" + name, 3, 3, 1, Inputs(300 + code, {{0, 1}, {0, 1}, {0, 1.1}}, 25, kXyzEdges),
-                         Engine(xyz, appearance, 0)});
+                         Engine(xyz, appearance, AdaptationMethod::None)});
         paths.push_back({name + "->xyz", 3, 3, 100, Inputs(400 + code, correlates, 25),
-                         Engine(appearance, xyz, 0)});
+                         Engine(appearance, xyz, AdaptationMethod::None)});
     }
     return paths;
 }
