@@ -114,10 +114,13 @@ void cCentroidLookup::BuildGrid(int32_t bucket) {
 int32_t cCentroidLookup::BoxOf(const Grid& grid, const double* lab) {
     int32_t box = 0;
     for (int32_t axis = 0; axis < 3; ++axis) {
-        const double size = kGridHalf[axis] / kGridCells[axis];
+        // A product may put a color on a box border into the next box, whose candidates still
+        // serve it: boxes are closed and the candidates kept with slack.
+        const double cellsPerUnit = kGridCells[axis] / kGridHalf[axis];
         const double offset = lab[axis] - grid.low[axis];
         if (!(offset >= 0.0 && offset <= kGridHalf[axis])) return -1;
-        box = box * kGridCells[axis] + std::min(static_cast<int32_t>(offset / size), kGridCells[axis] - 1);
+        box = box * kGridCells[axis] +
+              std::min(static_cast<int32_t>(offset * cellsPerUnit), kGridCells[axis] - 1);
     }
     return box;
 }
@@ -133,16 +136,17 @@ int32_t cCentroidLookup::Nearest(const double* lab) const {
         first = grid.candidates.data() + grid.start[box];
         last = grid.candidates.data() + grid.start[box + 1];
     }
+    if (first == last) return -1;
     // In index order, only a strictly smaller distance replaces the best, so ties keep the lower
-    // index; the first candidate is taken even when a far color's distance overflows.
-    double best = 0.0;
-    int32_t result = -1;
-    for (const int16_t* index = first; index != last; ++index) {
+    // index; the first candidate is taken even when a far color's distance overflows. Selected
+    // without branches: which candidate wins is as good as random.
+    double best = DistanceSquared(lab, kIsccNbsCentroids[*first - 1].lab);
+    int32_t result = *first;
+    for (const int16_t* index = first + 1; index != last; ++index) {
         const double distance = DistanceSquared(lab, kIsccNbsCentroids[*index - 1].lab);
-        if (result < 0 || distance < best) {
-            best = distance;
-            result = *index;
-        }
+        const int32_t closer = distance < best;
+        best = std::min(best, distance);
+        result += (*index - result) & -closer;
     }
     return result;
 }

@@ -5,14 +5,16 @@
 #include <limits>
 #include <numbers>
 
+#include "ColorSpaceTable.h"
 #include "ColorTranslator.h"
+#include "ElementaryFunctions.h"
 #include "MathEngine.h"
 
 namespace {
 
-constexpr double kTwoPi = 6.283185307179586;
-constexpr double kDegreesPerRadian = 57.29577951308232;
-constexpr double kPow25To7 = 6103515625.0;
+constexpr double kTwoPi = 2.0 * std::numbers::pi;
+constexpr double kDegreesPerRadian = 180.0 / std::numbers::pi;
+constexpr double kPow25To7 = 6103515625.0;  // 25^7
 
 double Pow7(double x) {
     const double x2 = x * x;
@@ -31,8 +33,7 @@ cMatrixDC LabRows(const cMatrixDC& source, int32_t rows, const ColorSpaceStruct&
 // Both inputs passed through a CIELAB-to-CIELAB engine; false when the engine refuses them.
 bool TranslateLabPair(const cMatrixDC& reference, const cMatrixDC& sample, int32_t rows,
                       cMatrixDC& outReference, cMatrixDC& outSample) {
-    ColorSpaceStruct lab;
-    lab.SetType(3);
+    const ColorSpaceStruct lab = cColorSpaceTable::DefaultDescription(ColorSpaceCode::Lab);
     cColorTranslator translator;
     translator.SetSource(lab);
     translator.SetDestination(lab);
@@ -180,22 +181,33 @@ double cCIEDE2000::CalculateDeltaE(const double* reference, const double* sample
     const double C1p = std::sqrt(a1p * a1p + b1 * b1);
     const double C2p = std::sqrt(a2p * a2p + b2 * b2);
 
-    auto hue = [](double ap, double b) {
+    // The adjustments below select rather than branch: they depend on random hues.
+    using Elementary::Select;
+    auto hue = [](double ap, double b, auto atan2) {
         if (std::fabs(ap) + std::fabs(b) == 0.0) return 0.0;
-        const double h = std::atan2(b, ap);
-        return h < 0.0 ? h + kTwoPi : h;
+        const double h = atan2(b, ap);
+        return Select(h < 0.0, h + kTwoPi, h);
     };
-    const double h1p = hue(a1p, b1);
-    const double h2p = hue(a2p, b2);
+    const auto fast = [](double y, double x) { return Elementary::Atan2(y, x); };
+    const double h1p = hue(a1p, b1, fast);
+    const double h2p = hue(a2p, b2, fast);
 
     const double dLp = L2 - L1;
     const double dCp = C2p - C1p;
     const double CpProduct = C1p * C2p;
+    // Whether the hues lie more than pi apart: the sign of the cross product tells, except for hues
+    // opposite to within rounding, where the formula jumps and the decision stays with the
+    // standard library's correctly rounded angles (the published boundary pairs rely on them).
+    const double cross = a1p * b2 - b1 * a2p;
+    bool apart = ((cross < 0.0) & (h2p > h1p)) | ((cross > 0.0) & (h2p < h1p));
+    if (std::fabs(cross) <= 1e-9 * CpProduct && a1p * a2p + b1 * b2 < 0.0) {
+        const auto rounded = [](double y, double x) { return std::atan2(y, x); };
+        apart = std::fabs(hue(a1p, b1, rounded) - hue(a2p, b2, rounded)) > kPi;
+    }
     double dhp = h2p - h1p;
-    if (dhp > kPi) dhp -= kTwoPi;
-    if (dhp < -kPi) dhp += kTwoPi;
+    dhp = Select(apart, dhp - std::copysign(kTwoPi, dhp), dhp);
     if (CpProduct == 0.0) dhp = 0.0;
-    const double dHp = 2.0 * std::sqrt(CpProduct) * std::sin(0.5 * dhp);
+    const double dHp = 2.0 * std::sqrt(CpProduct) * Elementary::SinNearZero(0.5 * dhp);
 
     const double Lmp = 0.5 * (L1 + L2);
     const double Cmp = 0.5 * (C1p + C2p);
@@ -204,12 +216,13 @@ double cCIEDE2000::CalculateDeltaE(const double* reference, const double* sample
         hmp = h1p + h2p;
     } else {
         hmp = 0.5 * (h1p + h2p);
-        if (std::fabs(h1p - h2p) > kPi) hmp -= kPi;
-        if (hmp < 0.0) hmp += kTwoPi;
+        hmp = Select(apart, hmp - kPi, hmp);
+        hmp = Select(hmp < 0.0, hmp + kTwoPi, hmp);
     }
 
     // T from one sine/cosine pair through the multiple-angle identities instead of four cosines.
-    const double c1 = std::cos(hmp), s1 = std::sin(hmp);
+    double s1, c1;
+    Elementary::SinCos(hmp, s1, c1);
     const double c2 = c1 * c1 - s1 * s1, s2 = 2.0 * s1 * c1;
     const double c3 = c2 * c1 - s2 * s1, s3 = s2 * c1 + c2 * s1;
     const double c4 = c2 * c2 - s2 * s2, s4 = 2.0 * s2 * c2;
@@ -224,11 +237,11 @@ double cCIEDE2000::CalculateDeltaE(const double* reference, const double* sample
     const double SC = 1.0 + 0.045 * Cmp;
     const double SH = 1.0 + 0.015 * Cmp * T;
 
-    const double hmpDegreesOff = (hmp * kDegreesPerRadian - 275.0) / 25.0;
-    const double dTheta = 0.5235987756087708 * std::exp(-hmpDegreesOff * hmpDegreesOff);
+    const double hmpDegreesOff = (hmp * kDegreesPerRadian - 275.0) * (1.0 / 25.0);
+    const double dTheta = 0.5235987756087708 * Elementary::Exp(-hmpDegreesOff * hmpDegreesOff);
     const double Cmp7 = Pow7(Cmp);
     const double RC = 2.0 * std::sqrt(Cmp7 / (Cmp7 + kPow25To7));
-    const double RT = -std::sin(2.0 * dTheta) * RC;
+    const double RT = -Elementary::SinNearZero(2.0 * dTheta) * RC;
 
     const double l = dLp / (kL_ * SL);
     const double c = dCp / (kC_ * SC);

@@ -4,6 +4,9 @@
 #include <vector>
 
 #include "CentroidLookup.h"
+#include "ColorSpaceLab.h"
+#include "ColorSpaceSRGB.h"
+#include "ColorSpaceTable.h"
 #include "IsccNbsCatalogue.h"
 #include "pigmo/bp.h"
 
@@ -107,16 +110,35 @@ struct Group {
     double distance = 1e20;
 };
 
+// BPConvertsRGB2Lab of 8-bit colors, to the last bit: the same sRGB and Lab steps, with the
+// transfer function looked up for the 256 values a channel can take.
+class ByteSRGBToLab {
+public:
+    ByteSRGBToLab() : lab_(cColorSpaceTable::DefaultDescription(ColorSpaceCode::Lab)) {
+        for (int v = 0; v < 256; ++v) linear_[v] = cColorSpaceSRGB::DecodeSRGB(v / 255.0);
+    }
+
+    void Convert(uint32_t rgb, double* lab) const {
+        const double linear[3] = {linear_[rgb >> 16], linear_[(rgb >> 8) & 0xFF], linear_[rgb & 0xFF]};
+        double xyz[3];
+        cColorSpaceSRGB::LinearToXYZ(linear, xyz);
+        lab_.FromXYZ(xyz, lab);
+    }
+
+private:
+    double linear_[256];
+    // FromXYZ changes nothing, so threads share it; the node interface just is not const.
+    mutable cColorSpaceLab lab_;
+};
+
 // Adds the tallied colors to the groups of their nearest centroids, as Lab sums until averaged.
-bool AddToGroups(const ColorTally& tally, std::vector<Group>& groups) {
+void AddToGroups(const ColorTally& tally, std::vector<Group>& groups) {
+    static const ByteSRGBToLab toLab;
     const cCentroidLookup& lookup = cCentroidLookup::Instance();
     for (const ColorTally::Entry& entry : tally.Slots()) {
         if (entry.count == 0) continue;
-        const double rgb[3] = {static_cast<double>(entry.rgb >> 16),
-                               static_cast<double>((entry.rgb >> 8) & 0xFF),
-                               static_cast<double>(entry.rgb & 0xFF)};
         double lab[3];
-        if (BPConvertsRGB2Lab(rgb, lab) != 1) return false;
+        toLab.Convert(entry.rgb, lab);
         const int32_t index = lookup.Nearest(lab);
         if (index < 1) continue;
         Group& group = groups[index - 1];
@@ -125,7 +147,6 @@ bool AddToGroups(const ColorTally& tally, std::vector<Group>& groups) {
         const double weight = static_cast<double>(entry.count);
         for (int i = 0; i < 3; ++i) group.lab[i] += weight * lab[i];
     }
-    return true;
 }
 
 uint32_t ColorAt(const unsigned char* row, int x) {
@@ -136,7 +157,7 @@ uint32_t ColorAt(const unsigned char* row, int x) {
 // Every second pixel from the last one backwards, column by column from the right, each column
 // from the bottom. Rows are walked in memory order; each sample's place in that column order is
 // computed instead, since only the tie between equally large groups depends on it.
-bool SampleIntoGroups(const unsigned char* pixels, int width, int height, std::vector<Group>& groups) {
+void SampleIntoGroups(const unsigned char* pixels, int width, int height, std::vector<Group>& groups) {
     constexpr int kAhead = 32;  // pixels, 16 samples
     ColorTally tally;
     const uint64_t rowsSampled = (static_cast<uint64_t>(height) + 1) / 2;
@@ -149,13 +170,13 @@ bool SampleIntoGroups(const unsigned char* pixels, int width, int height, std::v
             const uint32_t rgb = ColorAt(row, x);
             const uint64_t position = column * rowsSampled + rowPlace;
             if (!tally.Add(rgb, position)) {
-                if (!AddToGroups(tally, groups)) return false;
+                AddToGroups(tally, groups);
                 tally.Clear();
                 tally.Add(rgb, position);
             }
         }
     }
-    return AddToGroups(tally, groups);
+    AddToGroups(tally, groups);
 }
 
 // Averages the groups and writes the means of `wanted` of them, largest group first, then
@@ -204,9 +225,8 @@ extern "C" void BPImageExtractLab(const unsigned char* pixels, int width, int he
     int written = 0;
     if (pixels != nullptr && labOut != nullptr && width > 0 && height > 0) {
         std::vector<Group> groups(kIsccNbsCentroidCount);
-        if (SampleIntoGroups(pixels, width, height, groups)) {
-            written = SelectDominant(groups, colourCount < 1 ? 10 : colourCount, labOut);
-        }
+        SampleIntoGroups(pixels, width, height, groups);
+        written = SelectDominant(groups, colourCount < 1 ? 10 : colourCount, labOut);
     }
     if (countOut) *countOut = written;
 }

@@ -78,8 +78,21 @@ void PigmoConversion(benchmark::State& state) {
     state.SetItemsProcessed(state.iterations());
 }
 
-// Little CMS transform between the D50 Lab profile and built-in sRGB, one color per call.
-template <bool FromLab>
+// The whole input array in one call.
+template <int (*Convert)(const double*, double*, size_t), const std::vector<double> Inputs::*Source>
+void PigmoArray(benchmark::State& state) {
+    const std::vector<double>& source = TheInputs().*Source;
+    std::vector<double> out(3 * kColorCount);
+    for (auto _ : state) {
+        benchmark::DoNotOptimize(Convert(source.data(), out.data(), kColorCount));
+        benchmark::ClobberMemory();
+    }
+    state.SetItemsProcessed(state.iterations() * kColorCount);
+}
+
+// Little CMS transform between the D50 Lab profile and built-in sRGB, one color per call or the
+// whole array in one.
+template <bool FromLab, size_t PerCall>
 void LittleCmsConversion(benchmark::State& state) {
     cmsHPROFILE lab = cmsCreateLab4Profile(cmsD50_xyY());
     cmsHPROFILE srgb = cmsCreate_sRGBProfile();
@@ -90,14 +103,15 @@ void LittleCmsConversion(benchmark::State& state) {
     if (!FromLab) {
         for (double& v : source) v /= 255.0;  // Little CMS takes RGB doubles on 0..1
     }
-    double out[3];
+    std::vector<double> out(3 * PerCall);
     size_t i = 0;
     for (auto _ : state) {
-        cmsDoTransform(transform, &source[i * 3], out, 1);
-        benchmark::DoNotOptimize(out);
-        i = (i + 1) & (kColorCount - 1);
+        cmsDoTransform(transform, &source[i * 3], out.data(), PerCall);
+        benchmark::DoNotOptimize(out.data());
+        benchmark::ClobberMemory();
+        i = (i + PerCall) & (kColorCount - 1);
     }
-    state.SetItemsProcessed(state.iterations());
+    state.SetItemsProcessed(state.iterations() * PerCall);
     cmsDeleteTransform(transform);
     cmsCloseProfile(srgb);
     cmsCloseProfile(lab);
@@ -106,9 +120,13 @@ void LittleCmsConversion(benchmark::State& state) {
 BENCHMARK(PigmoDeltaE2000);
 BENCHMARK(LittleCmsDeltaE2000);
 BENCHMARK(PigmoConversion<BPConvertLab2sRGB, &Inputs::lab, 3>)->Name("PigmoLab2sRGB");
-BENCHMARK(LittleCmsConversion<true>)->Name("LittleCmsLab2sRGB");
+BENCHMARK(LittleCmsConversion<true, 1>)->Name("LittleCmsLab2sRGB");
 BENCHMARK(PigmoConversion<BPConvertsRGB2Lab, &Inputs::rgb, 3>)->Name("PigmosRGB2Lab");
-BENCHMARK(LittleCmsConversion<false>)->Name("LittleCmssRGB2Lab");
+BENCHMARK(LittleCmsConversion<false, 1>)->Name("LittleCmssRGB2Lab");
+BENCHMARK(PigmoArray<BPConvertLab2sRGBArray, &Inputs::lab>)->Name("PigmoLab2sRGBArray");
+BENCHMARK(LittleCmsConversion<true, kColorCount>)->Name("LittleCmsLab2sRGBArray");
+BENCHMARK(PigmoArray<BPConvertsRGB2LabArray, &Inputs::rgb>)->Name("PigmosRGB2LabArray");
+BENCHMARK(LittleCmsConversion<false, kColorCount>)->Name("LittleCmssRGB2LabArray");
 BENCHMARK(PigmoConversion<BPConvert36BandSpectral2LabD502, &Inputs::spectra, 36>)
     ->Name("PigmoSpectral2LabD50");
 
@@ -118,5 +136,7 @@ int main(int argc, char** argv) {
     return Pigmo::Bench::RunBenchmarks(argc, argv,
                                        {{"DeltaE2000", "PigmoDeltaE2000", "LittleCmsDeltaE2000"},
                                         {"Lab2sRGB", "PigmoLab2sRGB", "LittleCmsLab2sRGB"},
-                                        {"sRGB2Lab", "PigmosRGB2Lab", "LittleCmssRGB2Lab"}});
+                                        {"sRGB2Lab", "PigmosRGB2Lab", "LittleCmssRGB2Lab"},
+                                        {"Lab2sRGB array", "PigmoLab2sRGBArray", "LittleCmsLab2sRGBArray"},
+                                        {"sRGB2Lab array", "PigmosRGB2LabArray", "LittleCmssRGB2LabArray"}});
 }

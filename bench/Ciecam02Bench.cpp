@@ -6,6 +6,7 @@
 
 #include "ColorSpaceCIECAM02.h"
 #include "ColorSpaceStruct.h"
+#include "ColorSpaceTable.h"
 #include "ColorTranslator.h"
 #include "RatioReporter.h"
 
@@ -32,7 +33,7 @@ const std::vector<double>& Colors() {
 
 ColorSpaceStruct JCh() {
     ColorSpaceStruct d;
-    d.SetType(10);
+    d.SetType(ColorSpaceCode::CIECAM02_JCh);
     for (int i = 0; i < 3; ++i) d.whitePoint[i] = kWhite[i];
     return d;  // viewing preset 0: Yb 50, La 300, average surround
 }
@@ -54,7 +55,7 @@ void PigmoNode(benchmark::State& state) {
 
 void PigmoTranslator(benchmark::State& state) {
     ColorSpaceStruct xyzSpace;
-    xyzSpace.SetType(6);
+    xyzSpace.SetType(ColorSpaceCode::XYZ);
     for (int i = 0; i < 3; ++i) xyzSpace.whitePoint[i] = kWhite[i];
     cColorTranslator forward;
     forward.SetSource(xyzSpace);

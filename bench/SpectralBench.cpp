@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "ColorSpaceSpectral.h"
+#include "ColorSpaceTable.h"
 #include "ColorTranslator.h"
 #include "RatioReporter.h"
 
@@ -18,15 +19,14 @@ namespace {
 constexpr int kBands = 36;
 constexpr size_t kColors = 4096;
 
-ColorSpaceStruct Books(int weighting) {
-    ColorSpaceStruct d = ColorSpaceStruct::BookSpectrum(1, 5003);
-    d.weighting = weighting;
+ColorSpaceStruct Books(WeightingMethod weighting) {
+    ColorSpaceStruct d = cColorSpaceTable::DefaultDescription(ColorSpaceCode::Spectral);
+    d.weighting = static_cast<int32_t>(weighting);
     return d;
 }
 
 ColorSpaceStruct LabOf(const ColorSpaceStruct& spectral) {
-    ColorSpaceStruct lab;
-    lab.SetType(3);
+    ColorSpaceStruct lab = cColorSpaceTable::DefaultDescription(ColorSpaceCode::Lab);
     lab.hasIlluminant = true;
     lab.illuminant = spectral.illuminant;
     return lab;
@@ -49,7 +49,7 @@ const std::vector<double>& Spectra() {
 
 // Weighting 4 (Sprague, the books' method), 0 direct, 5 Lagrange, 2 fixed table, 1 one-nanometre.
 void BM_SpectrumToLab(benchmark::State& state) {
-    const ColorSpaceStruct source = Books(static_cast<int>(state.range(0)));
+    const ColorSpaceStruct source = Books(static_cast<WeightingMethod>(state.range(0)));
     cColorTranslator engine;
     engine.SetSource(source);
     engine.SetDestination(LabOf(source));
@@ -67,7 +67,7 @@ BENCHMARK(BM_SpectrumToLab)->ArgName("weighting")->Arg(4)->Arg(0)->Arg(5)->Arg(2
 
 // The same conversion with the Lab step done by Little CMS on the node's XYZ.
 void BM_SpectrumToLabWithLcmsLab(benchmark::State& state) {
-    const ColorSpaceStruct source = Books(4);
+    const ColorSpaceStruct source = Books(WeightingMethod::Sprague);
     cColorSpaceSpectral node(source, source);
     const cmsCIEXYZ white = {source.illuminant.relativeWhite[0], 1.0, source.illuminant.relativeWhite[2]};
     const std::vector<double>& spectra = Spectra();
@@ -88,7 +88,7 @@ BENCHMARK(BM_SpectrumToLabWithLcmsLab);
 // Node construction: weighting 0 direct, 1 one-nanometre, 4 Sprague, 5 Lagrange, 2 fixed table;
 // observer 2 adds the physiological model.
 void BM_NodeConstruction(benchmark::State& state) {
-    ColorSpaceStruct source = Books(static_cast<int>(state.range(0)));
+    ColorSpaceStruct source = Books(static_cast<WeightingMethod>(state.range(0)));
     source.observer = static_cast<int>(state.range(1));
     for (auto _ : state) {
         cColorSpaceSpectral node(source, source);
@@ -107,7 +107,7 @@ BENCHMARK(BM_NodeConstruction)
 
 // The CIE 2006 observer at a field size without a published matrix derives its own.
 void BM_NodeConstructionDerivedObserver(benchmark::State& state) {
-    ColorSpaceStruct source = Books(4);
+    ColorSpaceStruct source = Books(WeightingMethod::Sprague);
     source.observer = 2;
     source.fieldSize = 5.0;
     for (auto _ : state) {

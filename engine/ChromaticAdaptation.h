@@ -4,27 +4,32 @@
 
 #include "Export.h"
 
+// Chromatic adaptation methods, with their stored values.
+enum class AdaptationMethod : int32_t {
+    None = 0,
+    XYZScaling = 1,
+    Bradford = 2,
+    Sharp = 3,
+    CMCCAT2000 = 4,
+    CAT02 = 5,
+};
+
+// CAT02's cone-response matrix to four decimals, as published; results depend on the rounding.
+inline constexpr double kCat02Matrix[9] = {0.7328, 0.4296, -0.1624, -0.7036, 1.6975,
+                                           0.0061, 0.0030, 0.0136,  0.9834};
+
 // Von Kries-type adaptation of connection-space XYZ from a source white to a destination white.
 class PIGMO_API ChromaticAdaptation {
 public:
-    enum Method : int32_t {
-        kNone = 0,
-        kXYZScaling = 1,
-        kBradford = 2,
-        kSharp = 3,
-        kCMCCAT2000 = 4,
-        kCAT02 = 5
-    };
+    // Methods outside the named ones give the identity.
+    ChromaticAdaptation(AdaptationMethod method, const double* sourceWhite, const double* destinationWhite);
 
-    // Methods outside 0..5 give the identity.
-    ChromaticAdaptation(int32_t method, const double* sourceWhite, const double* destinationWhite);
-
-    int32_t MethodCode() const { return method_; }
+    AdaptationMethod Method() const { return method_; }
     const double* Matrix() const { return matrix_; }  // 3x3, row-major
     // In place on the first three values.
     void Apply(double* xyz) const;
 
 private:
-    int32_t method_;
+    AdaptationMethod method_;
     double matrix_[9];
 };

@@ -1,10 +1,13 @@
 #include "ColorSpace.h"
 
 #include <cmath>
+#include <numbers>
+
+#include "ElementaryFunctions.h"
 
 namespace {
-constexpr double kTwoPi = 6.283185307179586;
-constexpr double kDegreesPerRadian = 57.29577951308232;
+constexpr double kTwoPi = 2.0 * std::numbers::pi;
+constexpr double kDegreesPerRadian = 180.0 / std::numbers::pi;
 }  // namespace
 
 cColorSpace::~cColorSpace() = default;
@@ -19,7 +22,7 @@ void cColorSpace::LabToLch(const double* in, double* out) {
     const double l = in[0];
     const double a = in[1];
     const double b = in[2];
-    double h = std::atan2(b, a);
+    double h = Elementary::Atan2(b, a);
     if (h < 0.0) h += kTwoPi;
     out[0] = l;
     out[1] = std::sqrt(a * a + b * b);
@@ -38,7 +41,8 @@ void cColorSpace::LchToLab(const double* in, double* out) {
     }
     double a;
     double b;
-    // tan() is unbounded at the vertical axes, so they are set directly.
+    // By the tangent rather than sine and cosine, as stored colors were computed; it is unbounded at
+    // the vertical axes, so they are set directly.
     if (h == 90.0) {
         a = 0.0;
         b = c;
@@ -46,7 +50,7 @@ void cColorSpace::LchToLab(const double* in, double* out) {
         a = 0.0;
         b = -c;
     } else {
-        const double t = std::tan(h / kDegreesPerRadian);
+        const double t = Elementary::Tan(h / kDegreesPerRadian);
         const double aa = c / std::sqrt(t * t + 1.0);
         const double bb = t * aa;
         // tan() loses the quadrant; the hue restores the signs.

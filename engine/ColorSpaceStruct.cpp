@@ -4,6 +4,8 @@
 #include <cstring>
 #include <limits>
 
+#include "ColorSpaceTable.h"
+
 namespace {
 
 // Viewing conditions of the appearance spaces; the third value is the surround's c factor.
@@ -23,22 +25,23 @@ constexpr double kLchChromaMaximum = 181.01933598376;  // 128 * sqrt(2)
 enum class RangeKind { Unit, LabLike, LchLike, Byte };
 
 RangeKind RangeKindOf(int32_t code) {
-    switch (code) {
-        case 3:
-        case 5:
-        case 13:
-        case 14:
-        case 23:
-        case 47:
+    using enum ColorSpaceCode;
+    switch (static_cast<ColorSpaceCode>(code)) {
+        case Lab:
+        case LabWithoutNode:
+        case CIECAM02_JChab:
+        case CIECAM02_JMhab:
+        case LinearHueLab:
+        case CIECAM02_JChabBrightness:
             return RangeKind::LabLike;
-        case 4:
-        case 9:
-        case 10:
-        case 11:
-        case 22:
+        case Lch:
+        case CIECAM97s:
+        case CIECAM02_JCh:
+        case CIECAM02_JMh:
+        case LinearHueLch:
             return RangeKind::LchLike;
-        case 24:
-        case 25:
+        case SRGB:
+        case LinearSRGB:
             return RangeKind::Byte;
         default:
             return RangeKind::Unit;
@@ -54,7 +57,6 @@ bool SameBits(double a, double b) {
 
 ColorSpaceStruct::ColorSpaceStruct() {
     ApplyViewingPreset(0);
-    weighting = 4;
 }
 
 std::unique_ptr<ColorSpaceStruct> ColorSpaceStruct::Clone() const {
@@ -68,9 +70,9 @@ int32_t ColorSpaceStruct::BandCount(double start, double end, double step) {
     return static_cast<int32_t>(bands) + 1;
 }
 
-ColorSpaceStruct ColorSpaceStruct::BookSpectrum(int32_t illuminantKind, double temperature) {
+ColorSpaceStruct ColorSpaceStruct::BookSpectrum(IlluminantKind illuminantKind, double temperature) {
     ColorSpaceStruct description;
-    description.SetType(2);
+    description.SetType(ColorSpaceCode::Spectral);
     description.wavelengthStart = 380.0;
     description.wavelengthEnd = 730.0;
     description.wavelengthStep = 10.0;
@@ -80,48 +82,27 @@ ColorSpaceStruct ColorSpaceStruct::BookSpectrum(int32_t illuminantKind, double t
 }
 
 int32_t ColorSpaceStruct::ChannelCountOf(int32_t code) {
+    if (const ColorSpaceEntry* entry = cColorSpaceTable::Find(code)) return entry->channels;
     if (code >= 48 && code <= 64) return kMultiChannelA[code - 48];
     if (code >= 65 && code <= 83) return kMultiChannelB[code - 65];
-    switch (code) {
-        case 1:
-            return 4;
-        case 3:
-        case 4:
-        case 5:
-        case 6:
-        case 7:
-        case 8:
-        case 9:
-        case 10:
-        case 11:
-        case 13:
-        case 14:
-        // Like the other appearance spaces, these nodes convert three values; fewer channels would
-        // leave the engine's buffers too small.
-        case 12:
-        case 15:
-        case 16:
-        case 17:
-        case 18:
-        case 19:
-        case 20:
-        case 21:
-        case 22:
-        case 23:
-        case 24:
-        case 25:
-        case 26:
-        case 47:
+    using enum ColorSpaceCode;
+    switch (static_cast<ColorSpaceCode>(code)) {
+        // The spaces without a node built here.
+        case LabWithoutNode:
+        case WithoutNode:
+        case CIECAM97s:
+        case LinearHueLch:
+        case LinearHueLab:
+        case CIECAM02_JChabBrightness:
             return 3;
-        case 27:
-            return 1;
         default:
             return 0;
     }
 }
 
 int32_t ColorSpaceStruct::GetChannelCount() const {
-    if (type == 2 || type == 46) return BandCount(wavelengthStart, wavelengthEnd, wavelengthStep);
+    if (Is(ColorSpaceCode::Spectral) || Is(ColorSpaceCode::UVOnOff))
+        return BandCount(wavelengthStart, wavelengthEnd, wavelengthStep);
     return ChannelCountOf(type);
 }
 

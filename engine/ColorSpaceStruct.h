@@ -8,6 +8,17 @@
 #include "IlluminantStruct.h"
 
 class ColorSpaceStruct;
+enum class ColorSpaceCode : int32_t;
+
+// How the spectral node builds its tristimulus weights, with their stored values.
+enum class WeightingMethod : int32_t {
+    Direct = 0,        // the colour-matching functions at the band wavelengths
+    OneNanometre = 1,  // spectra resampled to 1 nm
+    FixedTableA = 2,   // the precomputed 10-nm sets of the first kind
+    FixedTableB = 3,   // the precomputed 10-nm set of the second kind
+    Sprague = 4,
+    Lagrange = 5,
+};
 
 // Abstract description of a color space; ColorSpaceStruct is the one concrete kind.
 class PIGMO_API DescriptionStruct {
@@ -33,7 +44,7 @@ public:
     double wavelengthStart = 0.0;
     double wavelengthEnd = 0.0;
     double wavelengthStep = 0.0;
-    int32_t weighting = 4;
+    int32_t weighting = static_cast<int32_t>(WeightingMethod::Sprague);
     double viewingConditions[6] = {};
     bool emissive = false;
     std::vector<double> minimum;  // empty: default range
@@ -53,6 +64,9 @@ public:
     // Refuses codes 28 to 36; otherwise stores the code and drops both range arrays.
     virtual bool SetType(int32_t code);
     virtual int32_t GetType() const { return type; }
+    bool SetType(ColorSpaceCode code) { return SetType(static_cast<int32_t>(code)); }
+    ColorSpaceCode Code() const { return static_cast<ColorSpaceCode>(type); }
+    bool Is(ColorSpaceCode code) const { return type == static_cast<int32_t>(code); }
     virtual bool IsCompatible(const ColorSpaceStruct* other) const;
 
     bool SetMaximum(int32_t channel, double value);
@@ -70,5 +84,5 @@ public:
     // Band count of an evenly spaced grid: trunc((end - start) / step + 0.5) + 1.
     static int32_t BandCount(double start, double end, double step);
     // The color books' spectra: 36 bands, 380 to 730 nm by 10 nm, under the given illuminant.
-    static ColorSpaceStruct BookSpectrum(int32_t illuminantKind, double temperature);
+    static ColorSpaceStruct BookSpectrum(IlluminantKind illuminantKind, double temperature);
 };

@@ -13,4 +13,6 @@ bool IlluminantStruct::operator==(const IlluminantStruct& other) const {
     return values == other.values;
 }
 
-void IlluminantStruct::SetIlluminant(int32_t kind, double temperature) { ApplyIlluminant(*this, kind, temperature); }
+void IlluminantStruct::SetIlluminant(IlluminantKind kind, double temperature) {
+    ApplyIlluminant(*this, static_cast<int32_t>(kind), temperature);
+}

@@ -5,9 +5,32 @@
 
 #include "Export.h"
 
+// Kinds of light source, with their stored values.
+enum class IlluminantKind : int32_t {
+    None = 0,
+    Daylight = 1,  // CIE daylight at a color temperature
+    Planckian = 2,
+    A = 3,
+    B = 4,  // no data: becomes None
+    C = 5,
+    E = 6,
+    F1 = 7,
+    F2 = 8,
+    F3 = 9,
+    F4 = 10,  // F4 to F6: no data, become None
+    F5 = 11,
+    F6 = 12,
+    F7 = 13,
+    F8 = 14,
+    F9 = 15,
+    F10 = 16,
+    F11 = 17,
+    F12 = 18,
+};
+
 // Light source of spectral evaluation: its spectral power table and the white it produces.
 struct PIGMO_API IlluminantStruct {
-    int32_t kind = 0;  // 0 none, 1 daylight, 2 Planckian, 3 A, 5 C, 6 E, 7-9 F1-F3, 13-18 F7-F12
+    int32_t kind = 0;  // an IlluminantKind
     double colorTemperature = 0.0;
     double tableStart = 0.0;
     double tableEnd = 0.0;
@@ -27,5 +50,6 @@ struct PIGMO_API IlluminantStruct {
     // Becomes the illuminant of a kind (daylight and Planckian at temperature kelvin) with its
     // spectral power table and its relative white for this record's observer; kinds without
     // data become 0. A computed white replaces the temperature by its correlated temperature.
-    void SetIlluminant(int32_t kind, double temperature);
+    void SetIlluminant(IlluminantKind kind, double temperature);
+    IlluminantKind Kind() const { return static_cast<IlluminantKind>(kind); }
 };

@@ -9,45 +9,12 @@
 #include <sstream>
 #include <stdexcept>
 
-#include "ColorSpaceSRGB.h"
+#include "ColorSpaceTable.h"
 
 namespace {
 
-struct NamedSpace {
-    const char* name;
-    int32_t code;
-};
+using enum ColorSpaceCode;
 
-constexpr NamedSpace kNamedSpaces[] = {
-    {"spectral", 2},
-    {"density", 1},
-    {"xyz", 6},
-    {"yxy", 8},
-    {"lab", 3},
-    {"lch", 4},
-    {"srgb", 24},
-    {"linear-srgb", 25},
-    {"rimm", 26},
-    {"lux", 27},
-    {"ciecam02-jch", 10},
-    {"ciecam02-jmh", 11},
-    {"ciecam02-jsh", 12},
-    {"ciecam02-jchab", 13},
-    {"ciecam02-jmhab", 14},
-    {"ciecam02-jshab", 15},
-    {"ciecam02-qch", 16},
-    {"ciecam02-qmh", 17},
-    {"ciecam02-qsh", 18},
-    {"ciecam02-qchab", 19},
-    {"ciecam02-qmhab", 20},
-    {"ciecam02-qshab", 21},
-};
-
-constexpr int32_t kLastCode = 84;
-constexpr int32_t kSRGB = 24;
-constexpr int32_t kLinearSRGB = 25;
-constexpr int32_t kDensity = 1;
-constexpr int32_t kSpectral = 2;
 constexpr int kMaxBands = 100000;
 
 // ParseNumber for an option; flag is the option as typed, for messages.
@@ -114,7 +81,7 @@ void ApplyStep(const std::string& flag, const std::string& text, ColorSpaceStruc
 }
 
 void ApplyWeighting(const std::string& flag, const std::string& text, ColorSpaceStruct& description) {
-    if (text.size() != 1 || text[0] < '0' || text[0] > '5') {
+    if (text.size() != 1 || text[0] < '0' || text[0] > '0' + static_cast<int>(WeightingMethod::Lagrange)) {
         throw std::invalid_argument(flag + ": expected a method from 0 to 5, got '" + text + "'");
     }
     description.weighting = text[0] - '0';
@@ -126,19 +93,38 @@ void ApplyEmissive(const std::string&, const std::string&, ColorSpaceStruct& des
 
 struct NamedIlluminant {
     const char* name;
-    int32_t kind;
-    double temperature;  // 0: given after the colon
+    IlluminantKind kind;
+    double temperature;  // 0: given after the colon, for daylight and Planckian light
 };
 
 constexpr NamedIlluminant kIlluminants[] = {
-    {"d50", 1, 5003.0},    {"d55", 1, 5503.0}, {"d65", 1, 6504.0}, {"d75", 1, 7504.0}, {"daylight", 1, 0.0},
-    {"planckian", 2, 0.0}, {"a", 3, 2856.0},   {"c", 5, 0.0},      {"e", 6, 0.0},      {"f1", 7, 0.0},
-    {"f2", 8, 0.0},        {"f3", 9, 0.0},     {"f7", 13, 0.0},    {"f8", 14, 0.0},    {"f9", 15, 0.0},
-    {"f10", 16, 0.0},      {"f11", 17, 0.0},   {"f12", 18, 0.0},
+    {"d50", IlluminantKind::Daylight, 5003.0},
+    {"d55", IlluminantKind::Daylight, 5503.0},
+    {"d65", IlluminantKind::Daylight, 6504.0},
+    {"d75", IlluminantKind::Daylight, 7504.0},
+    {"daylight", IlluminantKind::Daylight, 0.0},
+    {"planckian", IlluminantKind::Planckian, 0.0},
+    {"a", IlluminantKind::A, 2856.0},
+    {"c", IlluminantKind::C, 0.0},
+    {"e", IlluminantKind::E, 0.0},
+    {"f1", IlluminantKind::F1, 0.0},
+    {"f2", IlluminantKind::F2, 0.0},
+    {"f3", IlluminantKind::F3, 0.0},
+    {"f7", IlluminantKind::F7, 0.0},
+    {"f8", IlluminantKind::F8, 0.0},
+    {"f9", IlluminantKind::F9, 0.0},
+    {"f10", IlluminantKind::F10, 0.0},
+    {"f11", IlluminantKind::F11, 0.0},
+    {"f12", IlluminantKind::F12, 0.0},
 };
 
+bool ByTemperature(const NamedIlluminant& il) {
+    return il.temperature == 0.0 &&
+           (il.kind == IlluminantKind::Daylight || il.kind == IlluminantKind::Planckian);
+}
+
 // The white belongs to the observer the colors are seen with.
-void Illuminate(ColorSpaceStruct& description, int32_t kind, double temperature) {
+void Illuminate(ColorSpaceStruct& description, IlluminantKind kind, double temperature) {
     description.illuminant = IlluminantStruct{};
     description.illuminant.observer = description.observer;
     description.illuminant.observerAge = description.observerAge;
@@ -150,7 +136,7 @@ void Illuminate(ColorSpaceStruct& description, int32_t kind, double temperature)
 std::string IlluminantNames() {
     std::string names = "none";
     for (const NamedIlluminant& il : kIlluminants) {
-        names += std::string(", ") + il.name + (il.kind <= 2 && il.temperature == 0.0 ? ":KELVIN" : "");
+        names += std::string(", ") + il.name + (ByTemperature(il) ? ":KELVIN" : "");
     }
     return names;
 }
@@ -165,7 +151,7 @@ void ApplyIlluminant(const std::string& flag, const std::string& text, ColorSpac
     const std::string name = text.substr(0, colon);
     for (const NamedIlluminant& il : kIlluminants) {
         if (name != il.name) continue;
-        const bool byTemperature = il.kind <= 2 && il.temperature == 0.0;
+        const bool byTemperature = ByTemperature(il);
         if (byTemperature != (colon != std::string::npos)) {
             throw std::invalid_argument(
                 flag + ": " + name +
@@ -256,18 +242,23 @@ constexpr DescriptionOption kOptions[] = {
      ApplyRange},
 };
 
-struct Adaptation {
+struct NamedAdaptation {
     const char* name;
-    int32_t method;
+    AdaptationMethod method;
 };
 
-constexpr Adaptation kAdaptations[] = {
-    {"none", 0}, {"xyz-scaling", 1}, {"bradford", 2}, {"sharp", 3}, {"cmccat2000", 4}, {"cat02", 5},
+constexpr NamedAdaptation kAdaptations[] = {
+    {"none", AdaptationMethod::None},
+    {"xyz-scaling", AdaptationMethod::XYZScaling},
+    {"bradford", AdaptationMethod::Bradford},
+    {"sharp", AdaptationMethod::Sharp},
+    {"cmccat2000", AdaptationMethod::CMCCAT2000},
+    {"cat02", AdaptationMethod::CAT02},
 };
 
 std::string AdaptationNames() {
     std::string names;
-    for (const Adaptation& a : kAdaptations) names += std::string(names.empty() ? "" : ", ") + a.name;
+    for (const NamedAdaptation& a : kAdaptations) names += std::string(names.empty() ? "" : ", ") + a.name;
     return names;
 }
 
@@ -307,18 +298,10 @@ void DescriptionOptions::AddTo(CLI::App& command) {
 }
 
 ColorSpaceStruct DescriptionOptions::Describe(ConversionSide side, int32_t code) const {
-    ColorSpaceStruct description;
-    if (!description.SetType(code)) {
+    if (!ColorSpaceStruct().SetType(code)) {
         throw std::invalid_argument(DescribeColorSpace(code) + " needs an extended description");
     }
-    // The sRGB nodes work relative to the white of their primaries.
-    if (code == kSRGB || code == kLinearSRGB) cColorSpaceSRGB::White(description.whitePoint);
-    if (code == kSpectral) {
-        // The grid of the color books.
-        description.wavelengthStart = 380.0;
-        description.wavelengthEnd = 730.0;
-        description.wavelengthStep = 10.0;
-    }
+    ColorSpaceStruct description = cColorSpaceTable::DefaultDescription(code);
     const char* prefix = side == ConversionSide::From ? "--from-" : "--to-";
     for (size_t i = 0; i < std::size(kOptions); ++i) {
         const std::string& own = side == ConversionSide::From ? given_[i].from : given_[i].to;
@@ -328,8 +311,10 @@ ColorSpaceStruct DescriptionOptions::Describe(ConversionSide side, int32_t code)
             kOptions[i].apply("--" + std::string(kOptions[i].name), given_[i].both, description);
         }
     }
-    if (code == kSpectral) {
-        if (!Gives(side, "illuminant")) Illuminate(description, 1, 5003.0);
+    if (description.Is(Spectral)) {
+        // The default light again, for the observer the options chose.
+        if (!Gives(side, "illuminant"))
+            Illuminate(description, kBookIlluminantKind, kBookIlluminantTemperature);
         if (!(description.wavelengthEnd > description.wavelengthStart)) {
             char text[128];
             std::snprintf(text, sizeof text, "%send (%g nm) must lie above %sstart (%g nm)", prefix,
@@ -362,31 +347,28 @@ bool DescriptionOptions::Gives(ConversionSide side, const std::string& name) con
 }
 
 void DescriptionOptions::ShareLight(const ColorSpaceStruct& source, ColorSpaceStruct& destination) const {
-    const int32_t code = destination.GetType();
-    if (source.GetType() != kSpectral || !source.hasIlluminant || code == kSpectral || code == kDensity ||
-        code == kSRGB || code == kLinearSRGB || Gives(ConversionSide::To, "white") ||
-        Gives(ConversionSide::To, "illuminant")) {
+    if (!source.Is(Spectral) || !source.hasIlluminant || destination.Is(Spectral) ||
+        destination.Is(Density) || destination.Is(SRGB) || destination.Is(LinearSRGB) ||
+        Gives(ConversionSide::To, "white") || Gives(ConversionSide::To, "illuminant")) {
         return;
     }
     destination.hasIlluminant = true;
     destination.illuminant = source.illuminant;
 }
 
-int32_t DescriptionOptions::AdaptationMethod() const {
-    for (const Adaptation& a : kAdaptations) {
+AdaptationMethod DescriptionOptions::Adaptation() const {
+    for (const NamedAdaptation& a : kAdaptations) {
         if (adapt_ == a.name) return a.method;
     }
     throw std::invalid_argument("--adapt: unknown method '" + adapt_ + "' (use " + AdaptationNames() + ")");
 }
 
 int32_t ParseColorSpace(const std::string& text) {
-    for (const NamedSpace& space : kNamedSpaces) {
-        if (text == space.name) return space.code;
-    }
+    if (const ColorSpaceEntry* space = cColorSpaceTable::Find(text)) return CodeValue(space->code);
     int32_t code = 0;
     const char* end = text.data() + text.size();
     const auto [ptr, ec] = std::from_chars(text.data(), end, code);
-    if (text.empty() || ec != std::errc() || ptr != end || code < 1 || code > kLastCode) {
+    if (text.empty() || ec != std::errc() || ptr != end || code < 1 || code > kLastColorSpaceCode) {
         throw std::invalid_argument("unknown color space '" + text + "' (use a code from 1 to 84 or one of " +
                                     ColorSpaceNames() + ")");
     }
@@ -394,17 +376,16 @@ int32_t ParseColorSpace(const std::string& text) {
 }
 
 std::string DescribeColorSpace(int32_t code) {
-    for (const NamedSpace& space : kNamedSpaces) {
-        if (code == space.code) return std::string(space.name) + " (" + std::to_string(code) + ")";
-    }
+    if (const ColorSpaceEntry* space = cColorSpaceTable::Find(code))
+        return std::string(space->name) + " (" + std::to_string(code) + ")";
     return "code " + std::to_string(code);
 }
 
 std::string ColorSpaceNames() {
     std::string names;
-    for (const NamedSpace& space : kNamedSpaces) {
+    for (const ColorSpaceEntry& space : cColorSpaceTable::All()) {
         if (!names.empty()) names += ", ";
-        names += std::string(space.name) + " (" + std::to_string(space.code) + ")";
+        names += std::string(space.name) + " (" + std::to_string(CodeValue(space.code)) + ")";
     }
     return names;
 }

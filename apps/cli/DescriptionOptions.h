@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "ChromaticAdaptation.h"
 #include "ColorSpaceStruct.h"
 
 // Which description of a conversion an option applies to.
@@ -24,8 +25,8 @@ public:
     // table order. Throws std::invalid_argument with a one-line message naming the option.
     ColorSpaceStruct Describe(ConversionSide side, int32_t code) const;
 
-    // Chromatic adaptation method of the engine (0 to 5) from --adapt.
-    int32_t AdaptationMethod() const;
+    // Chromatic adaptation method of the engine from --adapt.
+    AdaptationMethod Adaptation() const;
 
     // A destination without a white of its own takes the light of a spectral source, so that the
     // source's perfect white is the destination's white (as the color books convert).

@@ -30,15 +30,10 @@ public:
         const ColorSpaceStruct source = arguments.descriptions.Describe(ConversionSide::From, fromCode_);
         ColorSpaceStruct destination = arguments.descriptions.Describe(ConversionSide::To, toCode_);
         arguments.descriptions.ShareLight(source, destination);
-        translator_.SetAdaptation(arguments.descriptions.AdaptationMethod());
+        translator_.SetAdaptation(arguments.descriptions.Adaptation());
         translator_.SetSource(source);
-        if (translator_.SetDestination(destination) == kTranslatorRefused) {
-            throw std::runtime_error(PairText() + (source.observer != destination.observer
-                                                       ? "the two sides have different observers"
-                                                       : "refused, the destination needs spectral values"));
-        }
-        if (translator_.IsFailed())
-            throw std::runtime_error(PairText() + "no conversion between these spaces");
+        translator_.SetDestination(destination);
+        if (translator_.IsFailed()) throw std::runtime_error(PairText() + translator_.FailureReason());
         in_.resize(source.GetChannelCount());
         out_.resize(destination.GetChannelCount());
         if (in_.empty() || out_.empty()) {

@@ -2,6 +2,8 @@
 
 #include <cmath>
 
+#include "ChromaticAdaptation.h"
+#include "ColorSpaceTable.h"
 #include "Matrix3.h"
 
 namespace {
@@ -9,7 +11,6 @@ namespace {
 constexpr double kDegreesPerRadian = 57.29577951308232;
 
 // The matrices to the digits the model has always used, so results stay reproducible.
-constexpr double kCat02[9] = {0.7328, 0.4296, -0.1624, -0.7036, 1.6975, 0.0061, 0.003, 0.0136, 0.9834};
 constexpr double kCat02Inverse[9] = {1.096124, -0.278869, 0.182745,  0.454369, 0.473533,
                                      0.072098, -0.009628, -0.005698, 1.015326};
 // Hunt-Pointer-Estevez times the inverse of CAT02, and its inverse.
@@ -29,7 +30,7 @@ double Compress(double fl, double v) {
 
 double Expand(double fl, double va) {
     const double d = std::fabs(va - 0.1);
-    const double v = (100.0 / fl) * std::pow(27.13 * d / (400.0 - d), 2.380952380952381);
+    const double v = (100.0 / fl) * std::pow(27.13 * d / (400.0 - d), 1.0 / 0.42);
     return va > 0.1 ? v : -v;
 }
 
@@ -49,19 +50,20 @@ cColorSpaceCIECAM02::cColorSpaceCIECAM02(const ColorSpaceStruct& description)
 
     const double k = 1.0 / (5.0 * la + 1.0);
     const double k4 = k * k * k * k;
+    // The cube root to 14 digits, as stored appearance values were computed with it.
     fl_ = 0.2 * k4 * (5.0 * la) + 0.1 * (1.0 - k4) * (1.0 - k4) * std::pow(5.0 * la, 0.33333333333333);
     const double n = yb / white[1];
     nbb_ = 0.725 * std::pow(1.0 / n, 0.2);
     z_ = 1.48 + std::sqrt(n);
     // Not limited to 0..1: the published model leaves that to the caller.
-    d_ = f * (1.0 - 0.2777777777777778 * std::exp((-42.0 - la) / 92.0));
+    d_ = f * (1.0 - (1.0 / 3.6) * std::exp((-42.0 - la) / 92.0));
 
     double rgbW[3];
-    Multiply3(kCat02, white, rgbW);
+    Multiply3(kCat02Matrix, white, rgbW);
     for (int i = 0; i < 3; ++i) adapt_[i] = (white[1] / rgbW[i]) * d_ + 1.0 - d_;
     fl4_ = std::pow(fl_, 0.25);
     chromaScale_ = std::pow(1.64 - std::pow(0.29, n), 0.73);
-    hueScale_ = nc * 961.5384615384615 * nbb_;
+    hueScale_ = nc * (12500.0 / 13.0) * nbb_;
 
     double compressed[3];
     CompressedResponses(rgbW, compressed);
@@ -69,30 +71,30 @@ cColorSpaceCIECAM02::cColorSpaceCIECAM02(const ColorSpaceStruct& description)
 }
 
 std::unique_ptr<cColorSpaceCIECAM02> cColorSpaceCIECAM02::Create(const ColorSpaceStruct& description) {
-    switch (description.type) {
-        case 10:
+    switch (description.Code()) {
+        case ColorSpaceCode::CIECAM02_JCh:
             return std::make_unique<cColorSpaceCIECAM02_JCh>(description);
-        case 11:
+        case ColorSpaceCode::CIECAM02_JMh:
             return std::make_unique<cColorSpaceCIECAM02_JMh>(description);
-        case 12:
+        case ColorSpaceCode::CIECAM02_Jsh:
             return std::make_unique<cColorSpaceCIECAM02_Jsh>(description);
-        case 13:
+        case ColorSpaceCode::CIECAM02_JChab:
             return std::make_unique<cColorSpaceCIECAM02_JChab>(description);
-        case 14:
+        case ColorSpaceCode::CIECAM02_JMhab:
             return std::make_unique<cColorSpaceCIECAM02_JMhab>(description);
-        case 15:
+        case ColorSpaceCode::CIECAM02_Jshab:
             return std::make_unique<cColorSpaceCIECAM02_Jshab>(description);
-        case 16:
+        case ColorSpaceCode::CIECAM02_QCh:
             return std::make_unique<cColorSpaceCIECAM02_QCh>(description);
-        case 17:
+        case ColorSpaceCode::CIECAM02_QMh:
             return std::make_unique<cColorSpaceCIECAM02_QMh>(description);
-        case 18:
+        case ColorSpaceCode::CIECAM02_Qsh:
             return std::make_unique<cColorSpaceCIECAM02_Qsh>(description);
-        case 19:
+        case ColorSpaceCode::CIECAM02_QChab:
             return std::make_unique<cColorSpaceCIECAM02_QChab>(description);
-        case 20:
+        case ColorSpaceCode::CIECAM02_QMhab:
             return std::make_unique<cColorSpaceCIECAM02_QMhab>(description);
-        case 21:
+        case ColorSpaceCode::CIECAM02_Qshab:
             return std::make_unique<cColorSpaceCIECAM02_Qshab>(description);
         default:
             return nullptr;
@@ -119,7 +121,7 @@ cColorSpaceCIECAM02::Correlates cColorSpaceCIECAM02::Forward(const double* xyz) 
         if (sample[i] <= 0.0) sample[i] = 0.0;
     }
     double rgb[3];
-    Multiply3(kCat02, sample, rgb);
+    Multiply3(kCat02Matrix, sample, rgb);
     double p[3];
     CompressedResponses(rgb, p);
 
@@ -142,7 +144,7 @@ cColorSpaceCIECAM02::Correlates cColorSpaceCIECAM02::Forward(const double* xyz) 
 }
 
 void cColorSpaceCIECAM02::Inverse(double J, double C, double h, double* xyz) const {
-    const double t = J > 0.0 ? std::pow(C / (std::sqrt(J / 100.0) * chromaScale_), 1.1111111111111112) : 0.0;
+    const double t = J > 0.0 ? std::pow(C / (std::sqrt(J / 100.0) * chromaScale_), 1.0 / 0.9) : 0.0;
     const double achromatic = aw_ * std::pow(J / 100.0, 1.0 / (c_ * z_));
     const double hr = h / kDegreesPerRadian;
     const double p1 = hueScale_ * (std::cos(hr + 2.0) + 3.8);
@@ -153,14 +155,13 @@ void cColorSpaceCIECAM02::Inverse(double J, double C, double h, double* xyz) con
     if (t != 0.0) {
         const double sn = std::sin(hr);
         const double cs = std::cos(hr);
-        const double numerator = p2 * 3.05 * 0.32786885245901637;
+        const double numerator = p2 * 3.05 * (460.0 / 1403.0);
         // Divide by the larger of cos h and sin h to stay away from a zero denominator.
         if (std::fabs(cs) > std::fabs(sn)) {
-            a = numerator / ((p1 / t) / cs + 0.47826086956521735 - (sn / cs) * (-4.695652173913044));
+            a = numerator / ((p1 / t) / cs + 11.0 / 23.0 - (sn / cs) * (-108.0 / 23.0));
             b = a * sn / cs;
         } else {
-            b = numerator /
-                ((cs / sn) * 0.47826086956521735 + (p1 / t) / sn - 0.01924447612259444 + 4.714896650035638);
+            b = numerator / ((cs / sn) * (11.0 / 23.0) + (p1 / t) / sn - 27.0 / 1403.0 + 6615.0 / 1403.0);
             a = b * cs / sn;
         }
     }

@@ -1,16 +1,16 @@
 #include "ColorSpaceLab.h"
 
-#include <cmath>
+#include "ElementaryFunctions.h"
 
 namespace {
-constexpr double kSixteenOver116 = 0.13793103448275862;
+constexpr double kSixteenOver116 = 16.0 / 116.0;
 constexpr double kSlope = 7.7867;
 // The long-established rounded constants, not 6/29 and (6/29)^3: stored colors depend on them.
 constexpr double kFThreshold = 0.2069;
 constexpr double kXYZThreshold = 0.008856;
 
 double ForwardF(double t) {
-    return t > kXYZThreshold ? std::pow(t, 0.3333333333333333) : kSlope * t + kSixteenOver116;
+    return t > kXYZThreshold ? Elementary::CubeRoot(t) : kSlope * t + kSixteenOver116;
 }
 }  // namespace
 
@@ -33,7 +33,7 @@ double cColorSpaceLab::InverseF(double t, double cube) {
 void cColorSpaceLab::ToXYZ(const double* in, double* out) {
     double f[3];
     LabToF(in, f);
-    for (int i = 0; i < 3; ++i) out[i] = white_[i] * InverseF(f[i], std::pow(f[i], 3.0));
+    for (int i = 0; i < 3; ++i) out[i] = white_[i] * InverseF(f[i], f[i] * f[i] * f[i]);
 }
 
 void cColorSpaceLab::FromXYZ(const double* in, double* out) {

@@ -1,6 +1,6 @@
 #include "ColorSpaceSRGB.h"
 
-#include <cmath>
+#include "ElementaryFunctions.h"
 
 // Four-decimal coefficients, as stored colors were computed with them.
 void cColorSpaceSRGB::LinearToXYZ(const double* rgb, double* xyz) {
@@ -22,14 +22,14 @@ void cColorSpaceSRGB::XYZToLinear(const double* xyz, double* rgb) {
 }
 
 double cColorSpaceSRGB::DecodeSRGB(double c) {
-    return c > 0.04045 ? std::pow((c + 0.055) / 1.055, 2.4) : c / 12.92;
+    return c > 0.04045 ? Elementary::RationalPower<12, 5>::Of((c + 0.055) / 1.055) : c / 12.92;
 }
 
 double cColorSpaceSRGB::EncodeSRGB(double v) {
     if (v < 0.0) return 0.0;
     if (v > 1.0) return 1.0;
     if (v <= 0.0031308) return 12.92 * v;
-    return 1.055 * std::pow(v, 0.4166666666666667) - 0.055;
+    return 1.055 * Elementary::RationalPower<5, 12>::Of(v) - 0.055;
 }
 
 void cColorSpaceSRGB::White(double* white) {

@@ -25,10 +25,19 @@ std::vector<double> EvenGrid(double start, double step, int32_t count) {
     return grid;
 }
 
-const FixedWeightingSet* FindFixedSet(const IlluminantStruct& il, int32_t method) {
+// The precomputed set for reflectance under the description's own light on 10-nm bands that fall
+// on the sets' rows, with the 2-degree observer; null when there is none.
+const FixedWeightingSet* FixedSetFor(const ColorSpaceStruct& source) {
+    const double firstRow = (source.wavelengthStart - kFixedWeightingStart) / 10.0;
+    if (source.emissive || !source.hasIlluminant || source.observer != 0 ||
+        std::fabs(source.wavelengthStep - 10.0) > 1e-8 || std::fabs(firstRow - std::round(firstRow)) > 1e-8) {
+        return nullptr;
+    }
+    const IlluminantStruct& il = source.illuminant;
     for (const FixedWeightingSet& set : kFixedWeightingSets) {
-        if (set.kind == il.kind && set.method == method &&
-            (set.kind != 1 || std::fabs(il.colorTemperature - set.colorTemperature) <= 1e-4)) {
+        if (set.kind == il.kind && set.method == source.weighting &&
+            (il.Kind() != IlluminantKind::Daylight ||
+             std::fabs(il.colorTemperature - set.colorTemperature) <= 1e-4)) {
             return &set;
         }
     }
@@ -51,36 +60,40 @@ void AddToBand(std::vector<double>& weights, int32_t band, double amount) {
 
 }  // namespace
 
-cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
-                                         const ColorSpaceStruct& destination) {
+SpectralIntegration cColorSpaceSpectral::IntegrationFor(const ColorSpaceStruct& source) {
+    using enum SpectralIntegration;
+    // The kernels reduce 1-nm weights onto 5- or 10-nm bands that start on a whole nanometre;
+    // Sprague's end extrapolation also reads six bands.
+    const double offset = source.wavelengthStart - kFirstSampleWavelength;
+    const bool kernelGrid =
+        IsKernelStep(source.wavelengthStep) && std::fabs(offset - std::trunc(offset)) <= 1e-10;
+    const bool sprague =
+        kernelGrid &&
+        ColorSpaceStruct::BandCount(source.wavelengthStart, source.wavelengthEnd, source.wavelengthStep) >= 6;
+    switch (static_cast<WeightingMethod>(source.weighting)) {
+        case WeightingMethod::OneNanometre:
+            return OneNanometre;
+        case WeightingMethod::FixedTableA:
+        case WeightingMethod::FixedTableB:
+            // Without a matching set the weights are computed, by Sprague where its kernel applies.
+            if (FixedSetFor(source)) return FixedTable;
+            return sprague ? Sprague : OneNanometre;
+        case WeightingMethod::Sprague:
+            return sprague ? Sprague : OneNanometre;
+        case WeightingMethod::Lagrange:
+            return kernelGrid ? Lagrange : OneNanometre;
+        default:
+            return Direct;
+    }
+}
+
+cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source, const ColorSpaceStruct& destination)
+    : mode_(IntegrationFor(source)) {
     emissive_ = source.emissive;
     start_ = source.wavelengthStart;
     end_ = source.wavelengthEnd;
     sourceStep_ = source.wavelengthStep;
     sourceBandCount_ = ColorSpaceStruct::BandCount(start_, end_, sourceStep_);
-
-    const bool kernelStep = IsKernelStep(sourceStep_);
-    switch (source.weighting) {
-        case 1:
-            mode_ = SpectralIntegration::OneNanometre;
-            break;
-        case 2:
-        case 3:
-            mode_ = SpectralIntegration::FixedTable;
-            break;
-        case 4:
-            mode_ = kernelStep ? SpectralIntegration::Sprague : SpectralIntegration::OneNanometre;
-            break;
-        case 5:
-            mode_ = kernelStep ? SpectralIntegration::Lagrange : SpectralIntegration::OneNanometre;
-            break;
-        default:
-            mode_ = SpectralIntegration::Direct;
-            break;
-    }
-    // Sprague's end extrapolation reads six bands.
-    if (mode_ == SpectralIntegration::Sprague && sourceBandCount_ < 6)
-        mode_ = SpectralIntegration::OneNanometre;
 
     sameGrid_ = destination.wavelengthStart == start_ && destination.wavelengthEnd == end_ &&
                 destination.wavelengthStep == sourceStep_;
@@ -99,7 +112,7 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
         illuminant_.observer = source.observer;
         illuminant_.observerAge = source.observerAge;
         illuminant_.fieldSize = source.fieldSize;
-        illuminant_.SetIlluminant(6, 0.0);
+        illuminant_.SetIlluminant(IlluminantKind::E, 0.0);
     } else if (source.hasIlluminant) {
         illuminant_ = source.illuminant;
     }
@@ -113,12 +126,9 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     workingBandCount_ = ColorSpaceStruct::BandCount(start_, end_, workingStep_);
 
     if (mode_ == SpectralIntegration::FixedTable) {
-        if (TryFixedTable(source)) return;
-        // Without a matching set the weights are computed, by Sprague where its kernel applies.
-        mode_ = kernelStep && sourceBandCount_ >= 6 ? SpectralIntegration::Sprague
-                                                    : SpectralIntegration::OneNanometre;
-        workingStep_ = 1.0;
-        workingBandCount_ = ColorSpaceStruct::BandCount(start_, end_, workingStep_);
+        UseFixedTable(*FixedSetFor(source));
+        workingStep_ = sourceStep_;
+        return;
     }
 
     illuminant_.observer = source.observer;
@@ -131,8 +141,6 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     const double gridStart = kFirstSampleWavelength + phase;
     const std::vector<double> illuminant =
         SampleIlluminant(illuminant_, mode_, gridStart, workingStep_, sampleCount);
-    const bool kernelMode = mode_ == SpectralIntegration::Sprague || mode_ == SpectralIntegration::Lagrange;
-    if (kernelMode && std::fabs(phase) > 1e-10) mode_ = SpectralIntegration::OneNanometre;
 
     if (mode_ == SpectralIntegration::Sprague || mode_ == SpectralIntegration::Lagrange) {
         BuildByReduction(source, gridStart, sampleCount, illuminant);
@@ -157,18 +165,9 @@ cColorSpaceSpectral::cColorSpaceSpectral(const ColorSpaceStruct& source,
     }
 }
 
-bool cColorSpaceSpectral::TryFixedTable(const ColorSpaceStruct& source) {
-    const double step = source.wavelengthStep;
-    const double firstRow = (start_ - kFixedWeightingStart) / 10.0;
-    if (!source.hasIlluminant || source.observer != 0 || std::fabs(step - 10.0) > 1e-8 ||
-        std::fabs(firstRow - std::round(firstRow)) > 1e-8) {
-        return false;
-    }
-    const FixedWeightingSet* set = FindFixedSet(illuminant_, source.weighting);
-    if (set == nullptr) return false;
-
+void cColorSpaceSpectral::UseFixedTable(const FixedWeightingSet& set) {
     // Rows outside the measured bands are carried by the end bands.
-    const int32_t rowOffset = static_cast<int32_t>(std::lround(firstRow));
+    const int32_t rowOffset = static_cast<int32_t>(std::lround((start_ - kFixedWeightingStart) / 10.0));
     for (int c = 0; c < 3; ++c) {
         WeightVector& vector = weights_[c];
         vector.weights.assign(sourceBandCount_, 0.0);
@@ -176,12 +175,10 @@ bool cColorSpaceSpectral::TryFixedTable(const ColorSpaceStruct& source) {
         vector.last = sourceBandCount_ - 1;
         for (int32_t row = 0; row < kFixedWeightingRows; ++row) {
             const int32_t band = std::clamp(row - rowOffset, 0, sourceBandCount_ - 1);
-            vector.weights[band] += set->weights[c][row];
+            vector.weights[band] += set.weights[c][row];
         }
         scale_[c] = 0.01;
     }
-    workingStep_ = step;
-    return true;
 }
 
 void cColorSpaceSpectral::BuildOnSampleGrid(const ColorSpaceStruct& source, double gridStart,

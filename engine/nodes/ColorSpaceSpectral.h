@@ -7,6 +7,8 @@
 #include "ColorSpaceStruct.h"
 #include "IlluminantStruct.h"
 
+struct FixedWeightingSet;
+
 // How the spectral node turns bands into tristimulus values.
 enum class SpectralIntegration : int32_t {
     Direct = 0,        // weights on the band grid itself
@@ -22,6 +24,9 @@ enum class SpectralIntegration : int32_t {
 class PIGMO_API cColorSpaceSpectral : public cColorSpace {
 public:
     cColorSpaceSpectral(const ColorSpaceStruct& source, const ColorSpaceStruct& destination);
+
+    // How spectra of a description are integrated: decided here alone, from the description.
+    static SpectralIntegration IntegrationFor(const ColorSpaceStruct& source);
 
     void ToXYZ(const double* in, double* out) override;
     void FromXYZ(const double* in, double* out) override;  // not invertible: leaves out untouched
@@ -41,7 +46,7 @@ private:
         int32_t last = -1;
     };
 
-    bool TryFixedTable(const ColorSpaceStruct& source);
+    void UseFixedTable(const FixedWeightingSet& set);
     void BuildOnSampleGrid(const ColorSpaceStruct& source, double gridStart, int32_t gridCount,
                            const std::vector<double>& illuminant);
     void BuildByReduction(const ColorSpaceStruct& source, double gridStart, int32_t gridCount,
@@ -69,5 +74,5 @@ private:
     std::vector<double> sourceGrid_;
     std::vector<double> destinationGrid_;
     IlluminantStruct illuminant_;
-    SpectralIntegration mode_ = SpectralIntegration::Direct;
+    SpectralIntegration mode_;
 };

@@ -3,6 +3,7 @@
 #include <array>
 #include <atomic>
 #include <cmath>
+#include <cstring>
 #include <thread>
 #include <vector>
 
@@ -126,6 +127,39 @@ TEST(Conversions, ConcurrentCallsReproduceSingleThreadResults) {
                     << kConversionCases[k].name << " " << variant;
             }
         }
+    }
+}
+
+// Whole arrays on several threads at once, through the plain engine path and the one with a
+// destination range; each result must be the single-color function's, bit for bit.
+TEST(Conversions, ArraysOnSeveralThreadsGiveTheSingleColorResults) {
+    using Batch = int (*)(const double*, double*, size_t);
+    const struct {
+        Conversion single;
+        Batch batch;
+        size_t width;
+    } cases[] = {{BPConvertsRGB2Lab, BPConvertsRGB2LabArray, 3},
+                 {BPConvert36BandSpectral2LinearsRGB, BPConvert36BandSpectral2LinearsRGBArray, 36}};
+    constexpr size_t kColors = 500;
+    for (const auto& c : cases) {
+        std::vector<double> in(kColors * c.width);
+        for (size_t i = 0; i < in.size(); ++i)
+            in[i] = std::fmod(i * 0.618034, 1.0) * (c.width == 3 ? 255 : 1);
+        std::vector<double> expected(3 * kColors);
+        for (size_t k = 0; k < kColors; ++k) ASSERT_EQ(c.single(&in[k * c.width], &expected[3 * k]), 1);
+        std::atomic<int> mismatches{0};
+        std::vector<std::thread> threads;
+        for (int t = 0; t < 4; ++t) {
+            threads.emplace_back([&] {
+                std::vector<double> out(3 * kColors);
+                for (int round = 0; round < 50; ++round) {
+                    mismatches += c.batch(in.data(), out.data(), kColors) != 1;
+                    mismatches += std::memcmp(out.data(), expected.data(), out.size() * sizeof(double)) != 0;
+                }
+            });
+        }
+        for (std::thread& thread : threads) thread.join();
+        EXPECT_EQ(mismatches.load(), 0);
     }
 }
 

@@ -134,11 +134,14 @@ TEST_P(TranslateFails, ReportsOneLineAndPrintsNothingOfTheColor) {
 INSTANTIATE_TEST_SUITE_P(
     Cli, TranslateFails,
     ::testing::Values(
-        FailureCase{"SourceWithoutNode", "5 3 1 2 3", "cannot convert from code 5 to lab (3)"},
-        FailureCase{"DestinationWithoutNode", "lab 7 1 2 3", "code 7"},
+        FailureCase{"SourceWithoutNode", "5 3 1 2 3",
+                    "cannot convert from code 5 to lab (3): no conversion from code 5"},
+        FailureCase{"DestinationWithoutNode", "lab 7 1 2 3", "no conversion to code 7"},
         FailureCase{"MultiChannelSpace", "60 xyz 1 2 3", "code 60"},
         FailureCase{"DifferentObservers", "--from-observer 1 lab lab 50 0 0", "different observers"},
-        FailureCase{"SpectralDestination", "lab 2 50 0 0", "needs spectral values"},
+        FailureCase{"SpectralDestination", "lab 2 50 0 0", "spectral values come only from spectral values"},
+        FailureCase{"DensitySource", "density lab 0.1 0.2 0.3 0.4", "densities convert only to the same"},
+        FailureCase{"DensityFromLab", "lab density 50 0 0", "densities come only from spectral values"},
         FailureCase{"TooFewValues", "lab srgb 1 2", "expected 3 values for lab (3), got 2"},
         FailureCase{"TooManyValues", "xyz lux 1 2 3 4", "got 4"},
         FailureCase{"NotANumber", "lab srgb 1 x 2", "'x' is not a number"},

@@ -20,7 +20,7 @@ ColorSpaceStruct OfType(int32_t code, const Triple& white = kD50) {
 }
 
 Triple Convert(const ColorSpaceStruct& source, const ColorSpaceStruct& destination, const Triple& in,
-               int32_t adaptation = 0) {
+               AdaptationMethod adaptation = AdaptationMethod::None) {
     cColorTranslator engine;
     engine.SetAdaptation(adaptation);
     engine.SetSource(source);
@@ -90,6 +90,8 @@ TEST(ColorTranslator, RefusedAndFailedPairs) {
         std::array<double, 16> out;
         out.fill(-7.0);
         EXPECT_EQ(engine.Translate(in.data(), out.data()), c.translate);
+        // Whatever cannot be converted says why.
+        EXPECT_EQ(engine.FailureReason().empty(), c.translate == 0) << engine.FailureReason();
         if (c.translate != 0) {
             EXPECT_EQ(out[0], -7.0);
         }
@@ -140,7 +142,7 @@ TEST(ColorTranslator, RangeMapping) {
 
 TEST(ColorTranslator, AdaptationMatricesMatchPublishedD65ToD50) {
     struct Case {
-        int32_t method;
+        AdaptationMethod method;
         Triple source, destination;
         std::array<double, 9> matrix;
         double tolerance;
@@ -151,11 +153,11 @@ TEST(ColorTranslator, AdaptationMatricesMatchPublishedD65ToD50) {
     const Triple d50xy{0.3457 / 0.3585, 1.0, (1.0 - 0.3457 - 0.3585) / 0.3585};
     // clang-format off
     const Case cases[] = {
-        {2, kD65, kD50, {1.0478112, 0.0228866, -0.0501270, 0.0295424, 0.9904844, -0.0170491,
+        {AdaptationMethod::Bradford, kD65, kD50, {1.0478112, 0.0228866, -0.0501270, 0.0295424, 0.9904844, -0.0170491,
                          -0.0092345, 0.0150436, 0.7521316}, 1e-7},
-        {5, d65xy, d50xy, {1.0425738, 0.0308910, -0.0528125, 0.0221934, 1.0018566, -0.0210737,
+        {AdaptationMethod::CAT02, d65xy, d50xy, {1.0425738, 0.0308910, -0.0528125, 0.0221934, 1.0018566, -0.0210737,
                            -0.0011648, -0.0034205, 0.7617890}, 2e-7},
-        {1, kD65, kD50, {0.96422 / 0.95047, 0, 0, 0, 1, 0, 0, 0, 0.82521 / 1.08883}, 1e-15},
+        {AdaptationMethod::XYZScaling, kD65, kD50, {0.96422 / 0.95047, 0, 0, 0, 1, 0, 0, 0, 0.82521 / 1.08883}, 1e-15},
     };
     // clang-format on
     for (const Case& c : cases) {
@@ -171,7 +173,7 @@ TEST(ColorTranslator, AdaptationMatricesMatchPublishedD65ToD50) {
         ExpectNear(white, c.destination, 1e-12);
     }
     // Sharp and CMCCAT2000 also carry the sRGB white onto a neutral D50 Lab.
-    for (int32_t method : {3, 4}) {
+    for (AdaptationMethod method : {AdaptationMethod::Sharp, AdaptationMethod::CMCCAT2000}) {
         ExpectNear(Convert(OfType(24, {0.9505, 1.0, 1.089}), OfType(3), {255, 255, 255}, method), {100, 0, 0},
                    1e-9);
     }

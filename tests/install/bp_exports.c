@@ -53,6 +53,60 @@ static void CheckConversions(void) {
     CheckStatus("BPConvertLab2sRGB(null)", BPConvertLab2sRGB(labWhite, NULL), 0);
 }
 
+typedef int (*Single)(const double*, double*);
+typedef int (*Batch)(const double*, double*, size_t);
+
+/* Each array function against its single-color sibling, over random colors and edge values. */
+static void CheckArrays(void) {
+    const struct {
+        const char* name;
+        Single single;
+        Batch batch;
+        int width;
+        double low, high;
+    } cases[] = {
+        {"BPConvert36BandSpectral2LabD502Array", BPConvert36BandSpectral2LabD502,
+         BPConvert36BandSpectral2LabD502Array, 36, -0.1, 1.1},
+        {"BPConvert36BandSpectral2LinearsRGBArray", BPConvert36BandSpectral2LinearsRGB,
+         BPConvert36BandSpectral2LinearsRGBArray, 36, -0.1, 1.1},
+        {"BPConvertsRGB2LabArray", BPConvertsRGB2Lab, BPConvertsRGB2LabArray, 3, -10, 265},
+        {"BPConvertLab2sRGBArray", BPConvertLab2sRGB, BPConvertLab2sRGBArray, 3, -130, 130},
+        {"BPConvertsLinearRGB2LabArray", BPConvertsLinearRGB2Lab, BPConvertsLinearRGB2LabArray, 3, -10, 265},
+        {"BPConvertLab2LinearsRGBArray", BPConvertLab2LinearsRGB, BPConvertLab2LinearsRGBArray, 3, -130, 130},
+        {"BPConvertLCh2LabArray", BPConvertLCh2Lab, BPConvertLCh2LabArray, 3, -10, 370},
+        {"BPConvertLab2LChArray", BPConvertLab2LCh, BPConvertLab2LChArray, 3, -130, 130},
+    };
+    enum { kColors = 300 };
+    static double in[kColors * 36], out[kColors * 3];
+    unsigned state = 12345u;
+    for (size_t c = 0; c < sizeof cases / sizeof cases[0]; ++c) {
+        const int width = cases[c].width;
+        for (int i = 0; i < kColors * width; ++i) {
+            state = state * 1103515245u + 12345u;
+            in[i] = cases[c].low + (cases[c].high - cases[c].low) * (state >> 8) / 16777216.0;
+        }
+        /* Zeros, a hue of 90 and a perfect white among the random colors. */
+        for (int i = 0; i < width; ++i) in[i] = 0.0;
+        for (int i = width; i < 2 * width; ++i) in[i] = i == 2 * width - 1 ? 90.0 : 50.0;
+        CheckStatus(cases[c].name, cases[c].batch(in, out, kColors), 1);
+        for (int k = 0; k < kColors; ++k) {
+            double single[3];
+            cases[c].single(in + k * width, single);
+            if (memcmp(single, out + 3 * k, sizeof single) != 0) {
+                printf("FAIL %s: color %d differs from the single-color result\n", cases[c].name, k);
+                ++failures;
+                break;
+            }
+        }
+        /* Nothing to convert is success; a missing array is a failure that writes nothing. */
+        CheckStatus(cases[c].name, cases[c].batch(in, out, 0), 1);
+        out[0] = -7.0;
+        CheckStatus(cases[c].name, cases[c].batch(NULL, out, kColors), 0);
+        CheckStatus(cases[c].name, cases[c].batch(in, NULL, kColors), 0);
+        Check(cases[c].name, out, (const double[]){-7.0}, 1, 0.0);
+    }
+}
+
 static void CheckDifferences(void) {
     const double reference[3] = {50, 20, -30}, sample[3] = {55, 18, -25};
     const double grey[3] = {50, 0, 0}, tinted[3] = {50, 3, 4};
@@ -185,6 +239,7 @@ static void CheckBooks(void) {
 
 int main(void) {
     CheckConversions();
+    CheckArrays();
     CheckDifferences();
     CheckHarmonies();
     CheckCatalogue();

@@ -63,7 +63,7 @@ TEST(SpectralCli, RefusesBadDescriptionsWithOneLine) {
         {"spectral lab --step 0 1", "--step: must be positive"},
         {"spectral lab --weighting 9 1", "--weighting: expected a method from 0 to 5"},
         {"spectral lab 1 1 1", "expected 36 values"},
-        {"lab spectral 50 0 0", "refused"},
+        {"lab spectral 50 0 0", "spectral values come only from spectral values"},
     };
     for (const auto& c : cases) {
         const RunResult run = Translate(c.arguments);

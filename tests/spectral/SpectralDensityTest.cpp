@@ -63,7 +63,7 @@ TEST(SpectralDensity, WeightsFollowTheGridAndIgnoreUnweightedBlackBands) {
     EXPECT_TRUE(std::isinf(d[2]));
     // An illuminant as reference: densities relative to its power near 100.
     density.hasIlluminant = true;
-    density.illuminant.SetIlluminant(6, 0);
+    density.illuminant.SetIlluminant(IlluminantKind::E, 0);
     const std::vector<double> e = Densities(std::vector<double>(36, 1.0), Grid(380, 730, 10), density);
     EXPECT_NEAR(e[2], 2.0, 1e-9);
 }

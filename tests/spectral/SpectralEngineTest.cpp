@@ -10,7 +10,7 @@
 namespace {
 
 ColorSpaceStruct Books(int kind = 1, double temperature = 5003) {
-    return ColorSpaceStruct::BookSpectrum(kind, temperature);
+    return ColorSpaceStruct::BookSpectrum(static_cast<IlluminantKind>(kind), temperature);
 }
 
 ColorSpaceStruct Of(int type, const ColorSpaceStruct& white) {

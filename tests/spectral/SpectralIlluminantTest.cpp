@@ -12,7 +12,7 @@ namespace {
 IlluminantStruct Make(int kind, double temperature, int observer = 0) {
     IlluminantStruct il;
     il.observer = observer;
-    il.SetIlluminant(kind, temperature);
+    il.SetIlluminant(static_cast<IlluminantKind>(kind), temperature);
     return il;
 }
 

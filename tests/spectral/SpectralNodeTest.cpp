@@ -18,7 +18,7 @@ ColorSpaceStruct Spectral(double start, double end, double step, int weighting, 
     d.observer = observer;
     d.hasIlluminant = true;
     d.illuminant.observer = observer;
-    d.illuminant.SetIlluminant(kind, temperature);
+    d.illuminant.SetIlluminant(static_cast<IlluminantKind>(kind), temperature);
     return d;
 }
 
@@ -104,7 +104,7 @@ TEST(SpectralNode, EmissiveUsesTheObserversOwnEqualEnergyWhiteAndTheLuminousFact
         d.emissive = true;
         IlluminantStruct equalEnergy;
         equalEnergy.observer = observer;
-        equalEnergy.SetIlluminant(6, 0);
+        equalEnergy.SetIlluminant(IlluminantKind::E, 0);
         const std::vector<double> xyz = Xyz(d, std::vector<double>(36, 1.0));
         EXPECT_NEAR(xyz[1], 68.3, 1e-9) << observer;
         EXPECT_NEAR(xyz[0], 68.3 * equalEnergy.relativeWhite[0], 1e-9) << observer;

@@ -37,6 +37,20 @@ PIGMO_BP_API int BPConvertLCh2Lab(const double* lch, double* lab);
 /* L*, a*, b* -> L*, chroma, hue in degrees (0 to 360). */
 PIGMO_BP_API int BPConvertLab2LCh(const double* lab, double* lch);
 
+/* The same conversions over arrays of count colors, one after the other (36 doubles a color for
+   the spectral ones, 3 for the others): 1 when every color converted, 0 otherwise (a null pointer
+   included). Each result equals the single-color function's bit for bit. */
+
+PIGMO_BP_API int BPConvert36BandSpectral2LabD502Array(const double* spectral, double* lab, size_t count);
+PIGMO_BP_API int BPConvert36BandSpectral2LinearsRGBArray(const double* spectral, double* linearRGB,
+                                                         size_t count);
+PIGMO_BP_API int BPConvertsRGB2LabArray(const double* sRGB, double* lab, size_t count);
+PIGMO_BP_API int BPConvertLab2sRGBArray(const double* lab, double* sRGB, size_t count);
+PIGMO_BP_API int BPConvertsLinearRGB2LabArray(const double* linearRGB, double* lab, size_t count);
+PIGMO_BP_API int BPConvertLab2LinearsRGBArray(const double* lab, double* linearRGB, size_t count);
+PIGMO_BP_API int BPConvertLCh2LabArray(const double* lch, double* lab, size_t count);
+PIGMO_BP_API int BPConvertLab2LChArray(const double* lab, double* lch, size_t count);
+
 /* Color differences between two L*, a*, b* triples; -1.0 when either pointer is null.
    CMC and CIE94 weight by the first (reference) color, so the order matters. */
 
