@@ -5,7 +5,8 @@ packages=(build-essential cmake pkg-config clang libclang-rt-14-dev
   libgtest-dev libgmock-dev libbenchmark-dev liblcms2-dev
   libpugixml-dev libcli11-dev nlohmann-json3-dev libstb-dev libpng-dev
   libcairo2-dev fonts-liberation
-  libgtk-4-dev xvfb xauth xdotool imagemagick)
+  libgtk-4-dev xvfb xauth xdotool imagemagick
+  python3-numpy python3-pytest blender)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")

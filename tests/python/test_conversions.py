@@ -1,5 +1,7 @@
 import math
 import random
+import subprocess
+import sys
 
 import numpy
 import pytest
@@ -39,7 +41,7 @@ def test_arrays_lists_and_single_colors_agree_exactly(convert):
     assert convert(numpy.array(colors[7])).tolist() == list(convert(colors[7]))
     # Any real dtype and any memory layout.
     as_float32 = numpy.asfortranarray(numpy.array(colors, dtype=numpy.float32))
-    assert convert(as_float32).tolist() == convert(as_float32.astype(numpy.float64).tolist())
+    assert [tuple(row) for row in convert(as_float32).tolist()] == convert(as_float32.astype(numpy.float64).tolist())
 
 
 # Sharma, Wu & Dalal (2005), Table 1: pairs 1, 7, 17, 25 and 34.
@@ -114,3 +116,10 @@ def test_catalogue_and_harmonies():
     companions = pigmo.harmony((60, 40 * math.cos(math.pi / 6), 40 * math.sin(math.pi / 6)), "triadic")
     assert [pigmo.lab_to_lch(lab)[2] for lab in companions] == pytest.approx([257.38, 97.61], abs=0.01)
     assert len(pigmo.harmony((50, 10, 10), "complement")) == 1
+
+
+def test_sequences_work_without_numpy():
+    code = "import sys; sys.modules['numpy'] = None; import pigmo; print(pigmo.lab_to_srgb([(50, 0, 0)])[0][0])"
+    run = subprocess.run([sys.executable, "-c", code], capture_output=True, text=True, check=False)
+    assert run.returncode == 0, run.stderr
+    assert float(run.stdout) == pigmo.lab_to_srgb((50, 0, 0))[0]
