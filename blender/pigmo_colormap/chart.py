@@ -1,13 +1,16 @@
 """A small picture of a reflectance curve, drawn pixel by pixel for a preview icon."""
 
-WIDTH, HEIGHT = 144, 64
+# Square, as the panel shows icons in a square.
+WIDTH, HEIGHT = 128, 128
 BACKGROUND = (0.92, 0.92, 0.92, 1.0)
 GRID = (0.75, 0.75, 0.75, 1.0)
 LINE = (0.1, 0.1, 0.1, 1.0)
+BAND = 12  # rows of the color itself at the bottom
+BASE = BAND + 3  # the row of reflectance 0
 
 
-def key(values):
-    return "chart " + ",".join(f"{v:.5g}" for v in values)
+def key(values, srgb):
+    return "chart " + ",".join(f"{v:.5g}" for v in (*srgb, *values))
 
 
 def render(values, srgb):
@@ -17,10 +20,10 @@ def render(values, srgb):
     top = max(1.0, max(values))
     band = tuple(channel / 255.0 for channel in srgb) + (1.0,)
     for x in range(WIDTH):
-        for y in range(4):
+        for y in range(BAND):
             pixels[y * WIDTH + x] = band
     for quarter in (1, 2, 3, 4):
-        y = 6 + round(quarter / 4 * (HEIGHT - 8))
+        y = BASE + round(quarter / 4 * (HEIGHT - BASE - 2))
         for x in range(WIDTH):
             pixels[min(y, HEIGHT - 1) * WIDTH + x] = GRID
 
@@ -30,7 +33,7 @@ def render(values, srgb):
         left = min(int(position), len(values) - 2) if len(values) > 1 else 0
         right = min(left + 1, len(values) - 1)
         value = values[left] + (values[right] - values[left]) * (position - left)
-        return 6 + round(max(0.0, value) / top * (HEIGHT - 8))
+        return BASE + round(max(0.0, value) / top * (HEIGHT - BASE - 2))
 
     previous = height_at(0)
     for x in range(WIDTH):

@@ -109,9 +109,10 @@ class PIGMO_OT_page(bpy.types.Operator):
 def draw_swatches(layout, scene, book, pick):
     pages = max(1, (len(book) + PAGE_SIZE - 1) // PAGE_SIZE)
     page = min(scene.pigmo_page, pages - 1)
-    header = layout.row()
+    header = layout.split(factor=0.6)
     header.label(text=f"{book.name or os.path.basename(book.path)}: {len(book)} colors")
     paging = header.row(align=True)
+    paging.alignment = "RIGHT"
     paging.enabled = pages > 1
     paging.operator("pigmo.page", text="", icon="TRIA_LEFT").step = -1
     paging.label(text=f"{page + 1} / {pages}")
@@ -150,7 +151,8 @@ def draw_pick(layout, pick):
     if pick["reflectance"]:
         box.label(text=f"Reflectance, {len(pick['reflectance'])} values (380 to 730 nm)")
         width, height, pixels = chart.render(pick["reflectance"], pick["srgb"])
-        box.template_icon(icon_value=_icon(chart.key(pick["reflectance"]), width, height, pixels), scale=6.0)
+        icon = _icon(chart.key(pick["reflectance"], pick["srgb"]), width, height, pixels)
+        box.template_icon(icon_value=icon, scale=6.0)
 
 
 def draw_panel(layout, context):

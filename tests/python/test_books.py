@@ -81,7 +81,8 @@ def _png(path: Path, pixels: numpy.ndarray) -> Path:
         return struct.pack(">I", len(data)) + kind + data + struct.pack(">I", zlib.crc32(kind + data))
 
     header = struct.pack(">IIBBBBB", width, height, 8, 2, 0, 0, 0)
-    return _write(path, b"\x89PNG\r\n\x1a\n" + chunk(b"IHDR", header) + chunk(b"IDAT", zlib.compress(raw)) + chunk(b"IEND", b""))
+    chunks = chunk(b"IHDR", header) + chunk(b"IDAT", zlib.compress(raw)) + chunk(b"IEND", b"")
+    return _write(path, b"\x89PNG\r\n\x1a\n" + chunks)
 
 
 def test_dominant_colors_of_a_file_and_of_its_pixels_agree(tmp_path):

@@ -30,7 +30,10 @@ def test_conversions_give_the_reference_values(convert, color, expected, toleran
     assert result == pytest.approx(expected, abs=tolerance)
 
 
-@pytest.mark.parametrize("convert", sorted({c[0] for c in CONVERSIONS}, key=lambda f: f.__name__), ids=lambda f: f.__name__)
+CONVERTERS = sorted({c[0] for c in CONVERSIONS}, key=lambda f: f.__name__)
+
+
+@pytest.mark.parametrize("convert", CONVERTERS, ids=lambda f: f.__name__)
 def test_arrays_lists_and_single_colors_agree_exactly(convert):
     width = 36 if convert.__name__.startswith("spectrum") else 3
     rng = random.Random(convert.__name__)
@@ -60,7 +63,8 @@ def test_ciede2000_matches_the_published_pairs_singly_and_as_arrays():
         assert pigmo.delta_e(lab1, lab2) == pytest.approx(value, abs=5e-5)
         assert pigmo.delta_e(lab2, lab1, method="ciede2000") == pytest.approx(value, abs=5e-5)
     assert pigmo.delta_e(numpy.array(firsts), numpy.array(seconds)) == pytest.approx(expected, abs=5e-5)
-    assert pigmo.delta_e(list(firsts), list(seconds)) == pigmo.delta_e(numpy.array(firsts), numpy.array(seconds)).tolist()
+    from_arrays = pigmo.delta_e(numpy.array(firsts), numpy.array(seconds))
+    assert pigmo.delta_e(list(firsts), list(seconds)) == from_arrays.tolist()
 
 
 @pytest.mark.parametrize(
