@@ -1,7 +1,5 @@
 """Finding and loading libpigmo.so, and the C signatures the package calls."""
 
-from __future__ import annotations
-
 import ctypes
 import os
 from pathlib import Path

@@ -1,7 +1,5 @@
 """Colors in and out of the C functions: one color as a sequence, many as a list or a numpy array."""
 
-from __future__ import annotations
-
 import ctypes
 from collections.abc import Callable, Sequence
 from typing import Any, Union
@@ -12,7 +10,9 @@ except ImportError:  # numpy is optional; without it colors are sequences only
     numpy = None
 
 Color = tuple[float, float, float]
-ColorInput = Union[Sequence[float], Sequence[Sequence[float]], "numpy.ndarray"]
+Array = Any if numpy is None else numpy.ndarray
+# One color, a list of colors, or an (N, width) array of them.
+ColorInput = Union[Sequence[float], Sequence[Sequence[float]], Array]
 
 _double_p = ctypes.POINTER(ctypes.c_double)
 
@@ -33,7 +33,7 @@ def doubles(values: Sequence[float], width: int, what: str) -> ctypes.Array:
         raise TypeError(f"{what}: every value must be a number, got {list(values)!r}") from None
 
 
-def rows(array: "numpy.ndarray", width: int, what: str) -> "numpy.ndarray":
+def rows(array: Array, width: int, what: str) -> Array:
     """A C-ordered float64 copy or view of an (N, width) array, or of one (width,) color as (1, width)."""
     if array.ndim == 1:
         array = array.reshape(1, -1)
@@ -44,7 +44,7 @@ def rows(array: "numpy.ndarray", width: int, what: str) -> "numpy.ndarray":
     return numpy.ascontiguousarray(array, dtype=numpy.float64)
 
 
-def pointer(array: "numpy.ndarray") -> Any:
+def pointer(array: Array) -> Any:
     return array.ctypes.data_as(_double_p)
 
 
@@ -59,7 +59,7 @@ def is_color_list(values: Any) -> bool:
     )
 
 
-def per_color(values: ColorInput, one: Callable[[Any], Any], many: Callable[["numpy.ndarray"], Any]) -> Any:
+def per_color(values: ColorInput, one: Callable[[Any], Any], many: Callable[[Array], Any]) -> Any:
     """Calls one for a single color, once per color for a list, and many for a numpy array."""
     if is_array(values):
         return many(values)

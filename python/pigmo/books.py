@@ -1,7 +1,5 @@
 """Color books (CxF 2.1 files) and the palettes found on this machine."""
 
-from __future__ import annotations
-
 import ctypes
 import os
 from collections.abc import Iterator
@@ -48,15 +46,15 @@ class BookColor(NamedTuple):
 class ColorBook:
     """A CxF 2.1 color book, read whole when it opens.
 
-    >>> book = ColorBook("ISCC-NBS Centroid Colors.cxf")  # doctest: +SKIP
-    >>> book.name, len(book), book[0].name  # doctest: +SKIP
+    >>> book = ColorBook("ISCC-NBS Centroid Colors.cxf")
+    >>> book.name, len(book), book[0].name
     ('ISCC-NBS Centroid Colors', 267, 'Vivid Pink')
 
     Raises ColorBookError with the reader's message when the file is missing or is not a version 2.1
     book. Colors are indexed from 0; negative indices count from the end.
     """
 
-    def __init__(self, path: Union[str, "os.PathLike[str]"]) -> None:
+    def __init__(self, path: Union[str, os.PathLike]) -> None:
         self.path = os.fspath(path)
         error = ctypes.create_string_buffer(1024)
         self._handle = lib.BPColorBookOpen(os.fsencode(self.path), error, len(error))
@@ -67,7 +65,8 @@ class ColorBook:
 
     def __del__(self) -> None:
         handle, self._handle = getattr(self, "_handle", None), None
-        if handle:
+        # At interpreter exit the module's globals may already be gone.
+        if handle and lib is not None:
             lib.BPColorBookClose(handle)
 
     def __len__(self) -> int:

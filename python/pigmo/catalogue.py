@@ -1,7 +1,5 @@
 """The ISCC-NBS centroid catalogue, color harmonies and the dominant colors of an image."""
 
-from __future__ import annotations
-
 import ctypes
 import os
 from typing import Any, NamedTuple, Union
@@ -67,7 +65,7 @@ def harmony(lab: Any, kind: str) -> list[Color]:
 
 
 def dominant_colors(
-    image: Union[str, "os.PathLike[str]", "_values.numpy.ndarray"], count: int = 10, max_pixels: int = 100_000_000
+    image: Union[str, os.PathLike, _values.Array], count: int = 10, max_pixels: int = 100_000_000
 ) -> list[Color]:
     """The dominant colors of an image as L*, a*, b* triples, the largest group first.
 
