@@ -275,6 +275,20 @@ bool ReadColorBook(const char* path, ColorBookVisitor& visitor, const char** err
     return true;
 }
 
+std::mutex& ColorBookReaderLock() {
+    static std::mutex lock;
+    return lock;
+}
+
+std::string ColorBookFailureText(const char* path, const char* errorMessage,
+                                 const ColorBookFailure& failure) {
+    const std::string where = path != nullptr ? path : "";
+    std::string text = errorMessage != nullptr ? errorMessage : "cannot read the book";
+    if (text.find(where) == std::string::npos) text = where + ": " + text;
+    if (!failure.cause.empty()) text += " (" + failure.cause + ")";
+    return text;
+}
+
 bool LoadColorBook(const char* path, std::vector<ColorInformation>& records, const char** errorMessage) {
     RecordAppender appender(records);
     return ReadColorBook(path, appender, errorMessage);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <mutex>
 #include <pugixml.hpp>
 #include <string>
 #include <vector>
@@ -34,6 +35,14 @@ public:
 protected:
     ~ColorBookVisitor() = default;
 };
+
+// The reader reports through shared buffers; callers on several threads hold this lock from the call
+// until they have copied its text.
+std::mutex& ColorBookReaderLock();
+
+// One line for a book that did not open: the reader's text, led by the path unless the text names it
+// already, then the cause where the failure gives one.
+std::string ColorBookFailureText(const char* path, const char* errorMessage, const ColorBookFailure& failure);
 
 // Loads path into document and checks it is a CxF 2.1 book. On failure returns false and points
 // *errorMessage (when not null) at a string-table text valid until the next error or string load.

@@ -6,7 +6,7 @@ packages=(build-essential cmake pkg-config clang libclang-rt-14-dev
   libpugixml-dev libcli11-dev nlohmann-json3-dev libstb-dev libpng-dev
   libcairo2-dev fonts-liberation
   libgtk-4-dev xvfb xauth xdotool imagemagick
-  help2man)
+  help2man python3-numpy python3-pytest blender)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing+=("$p")

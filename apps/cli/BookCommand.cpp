@@ -166,11 +166,7 @@ void RunBook(const BookArguments& arguments) {
     Pigmo::ColorBookFailure failure;
     if (!Pigmo::ReadColorBook(path.c_str(), printer, &error, &failure)) {
         if (failure.outOfMemory) throw std::bad_alloc();
-        std::string text = error != nullptr ? error : "cannot read the book";
-        // The "doesn't exist" text names the file already.
-        if (text.find(path) == std::string::npos) text = path + ": " + text;
-        if (!failure.cause.empty()) text += " (" + failure.cause + ")";
-        throw std::runtime_error(text);
+        throw std::runtime_error(Pigmo::ColorBookFailureText(path.c_str(), error, failure));
     }
     printer.End();
 }

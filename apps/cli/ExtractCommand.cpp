@@ -1,11 +1,5 @@
-#include <stb/stb_image.h>
-#include <unistd.h>
-
-#include <cerrno>
 #include <charconv>
-#include <cmath>
 #include <cstdio>
-#include <cstring>
 #include <memory>
 #include <nlohmann/json.hpp>
 #include <stdexcept>
@@ -14,9 +8,9 @@
 
 #include "ColorInformation.h"
 #include "Commands.h"
+#include "ImageFile.h"
 #include "Output.h"
 #include "Progress.h"
-#include "RegularFile.h"
 #include "ValueLines.h"
 #include "pigmo/bp.h"
 
@@ -35,45 +29,6 @@ struct DominantColor {
     int centroid;
 };
 
-// RGBA as decoded, one byte per channel, width x height pixels.
-struct DecodedImage {
-    std::unique_ptr<unsigned char, void (*)(void*)> rgba{nullptr, stbi_image_free};
-    int width = 0;
-    int height = 0;
-};
-
-// Reads the header before decoding, so a small file declaring a huge image is refused unread.
-DecodedImage Load(const std::string& path, long long maxPixels) {
-    std::string problem;
-    const int fd = Pigmo::Platform::OpenRegularFile(path, problem);
-    if (fd < 0) throw std::runtime_error("cannot open image '" + path + "': " + problem);
-    const std::unique_ptr<FILE, int (*)(FILE*)> file(fdopen(fd, "rb"), std::fclose);
-    if (!file) {
-        close(fd);
-        throw std::runtime_error("cannot open image '" + path +
-                                 "': " + Pigmo::Platform::SystemErrorText(errno));
-    }
-    DecodedImage image;
-    int channels = 0;
-    if (stbi_info_from_file(file.get(), &image.width, &image.height, &channels) != 0) {
-        const long long pixels = static_cast<long long>(image.width) * static_cast<long long>(image.height);
-        if (pixels > maxPixels) {
-            char text[160];
-            std::snprintf(text, sizeof text,
-                          "is %d x %d pixels (%.1f megapixels), above the limit of %lld pixels", image.width,
-                          image.height, static_cast<double>(pixels) / 1e6, maxPixels);
-            throw std::runtime_error("image '" + path + "' " + text + " (--max-pixels)");
-        }
-        image.rgba.reset(stbi_load_from_file(file.get(), &image.width, &image.height, &channels, 4));
-    }
-    if (!image.rgba) {
-        const char* reason = stbi_failure_reason();
-        throw std::runtime_error("cannot decode image '" + path +
-                                 "': " + (reason ? reason : "unknown error"));
-    }
-    return image;
-}
-
 // The whole text one integer from 1 to 267.
 int ParseCount(const std::string& text) {
     int value = 0;
@@ -84,25 +39,11 @@ int ParseCount(const std::string& text) {
     return value;
 }
 
-std::vector<DominantColor> Dominant(DecodedImage& image, int count) {
-    // The extraction reads byte 0 as padding and then red, green, blue: turn RGBA into ARGB in place.
-    unsigned char* pixel = image.rgba.get();
-    const size_t pixels = static_cast<size_t>(image.width) * static_cast<size_t>(image.height);
-    for (size_t i = 0; i < pixels; ++i, pixel += 4) {
-        const unsigned char alpha = pixel[3];
-        pixel[3] = pixel[2];
-        pixel[2] = pixel[1];
-        pixel[1] = pixel[0];
-        pixel[0] = alpha;
-    }
-    std::vector<double> lab(3 * static_cast<size_t>(count));
-    int found = 0;
-    BPImageExtractLab(image.rgba.get(), image.width, image.height, count, lab.data(), &found);
+std::vector<DominantColor> Dominant(Pigmo::DecodedImage& image, int count) {
+    const std::vector<double> lab = Pigmo::DominantLab(image, count);
     std::vector<DominantColor> colors;
-    for (int i = 0; i < found; ++i) {
-        const double* mean = &lab[3 * static_cast<size_t>(i)];
-        // Once no group stands apart the last pick repeats; the repeats say nothing new.
-        if (i > 0 && mean[0] == mean[-3] && mean[1] == mean[-2] && mean[2] == mean[-1]) break;
+    for (size_t i = 0; i < lab.size(); i += 3) {
+        const double* mean = &lab[i];
         DominantColor color{{mean[0], mean[1], mean[2]}, {}, BPCentroidGetForLab(mean)};
         double rgb[3];
         if (BPConvertLab2sRGB(mean, rgb) != 1 || color.centroid < 1) {
@@ -114,7 +55,7 @@ std::vector<DominantColor> Dominant(DecodedImage& image, int count) {
     return colors;
 }
 
-void PrintJson(const ExtractArguments& arguments, const DecodedImage& image,
+void PrintJson(const ExtractArguments& arguments, const Pigmo::DecodedImage& image,
                const std::vector<DominantColor>& colors) {
     nlohmann::json list = nlohmann::json::array();
     for (const DominantColor& color : colors) {
@@ -141,11 +82,11 @@ void PrintText(const std::vector<DominantColor>& colors) {
 void RunExtract(const ExtractArguments& arguments) {
     const int count = ParseCount(arguments.count);
     std::vector<DominantColor> colors;
-    DecodedImage image;
+    Pigmo::DecodedImage image;
     {
         Progress progress("extract");
         progress.Set("decoding " + arguments.image);
-        image = Load(arguments.image, arguments.maxPixels);
+        image = Pigmo::LoadImageFile(arguments.image, arguments.maxPixels, "--max-pixels");
         progress.Set("finding the dominant colors of " + std::to_string(image.width) + " x " +
                      std::to_string(image.height) + " pixels");
         colors = Dominant(image, count);

@@ -220,4 +220,45 @@ TEST(BatchMetrics, ClonesKeepTheirParameters) {
     }
 }
 
+// The C array functions over all the published pairs at once, in both orders, and with each
+// formula's weights equal to its single-pair function.
+TEST(ArrayDifferences, MatchThePublishedPairsAndTheSinglePairFunctions) {
+    std::vector<double> first, second;
+    for (const LabPair& p : kSharmaPairs) {
+        first.insert(first.end(), p.lab1, p.lab1 + 3);
+        second.insert(second.end(), p.lab2, p.lab2 + 3);
+    }
+    const size_t count = std::size(kSharmaPairs);
+    std::vector<double> out(count + 1, 42.0);
+    ASSERT_EQ(BPCalculateDeltaE2000Array(second.data(), first.data(), out.data(), count, 1, 1, 1), 1);
+    for (size_t i = 0; i < count; ++i) EXPECT_NEAR(out[i], kSharmaPairs[i].expected, 5e-5) << i;
+    EXPECT_EQ(out[count], 42.0);
+
+    const std::function<int(double*)> arrays[] = {
+        [&](double* o) { return BPCalculateDeltaEArray(first.data(), second.data(), o, count); },
+        [&](double* o) { return BPCalculateDeltaECMCArray(first.data(), second.data(), o, count, 2, 1); },
+        [&](double* o) { return BPCalculateDeltaE94Array(first.data(), second.data(), o, count, 2, 1, 1); },
+        [&](double* o) { return BPCalculateDeltaE2000Array(first.data(), second.data(), o, count, 1, 2, 1); },
+    };
+    const Metric singles[] = {BPCalculateDeltaE, Cmc(2, 1), E94(2), [](const double* x, const double* y) {
+                                  return BPCalculateDeltaE2000(x, y, 1, 2, 1);
+                              }};
+    for (size_t m = 0; m < std::size(arrays); ++m) {
+        ASSERT_EQ(arrays[m](out.data()), 1);
+        for (size_t i = 0; i < count; ++i) EXPECT_EQ(out[i], singles[m](&first[3 * i], &second[3 * i])) << m;
+    }
+}
+
+TEST(ArrayDifferences, NullPointersWriteNothing) {
+    const double lab[3] = {50, 0, 0};
+    double out = 42.0;
+    EXPECT_EQ(BPCalculateDeltaEArray(nullptr, lab, &out, 1), 0);
+    EXPECT_EQ(BPCalculateDeltaECMCArray(lab, nullptr, &out, 1, 2, 1), 0);
+    EXPECT_EQ(BPCalculateDeltaE94Array(lab, lab, nullptr, 1, 1, 1, 1), 0);
+    EXPECT_EQ(BPCalculateDeltaE2000Array(nullptr, nullptr, &out, 1, 1, 1, 1), 0);
+    EXPECT_EQ(out, 42.0);
+    EXPECT_EQ(BPCalculateDeltaE2000Array(lab, lab, &out, 0, 1, 1, 1), 1);
+    EXPECT_EQ(out, 42.0);
+}
+
 }  // namespace

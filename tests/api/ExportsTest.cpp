@@ -74,7 +74,16 @@ TEST(Exports, EveryCFunctionIsExportedUnmangled) {
         "BPCalculateDistanceSquared "
         "BPHarmonyGetMonochromatic BPHarmonyGetNearNeighbor BPHarmonyGetFarNeighbor BPHarmonyGetTriadic "
         "BPHarmonyGetComplement BPCentroidGetCount BPCentroidGetCategoryCount BPCentroidGetCategory "
-        "BPCentroidGetCategoryName BPCentroidGetName BPCentroidGetLab BPCentroidGetForLab BPImageExtractLab");
+        "BPCentroidGetCategoryName BPCentroidGetName BPCentroidGetLab BPCentroidGetForLab BPImageExtractLab "
+        "BPCalculateDeltaEArray BPCalculateDeltaECMCArray BPCalculateDeltaE94Array "
+        "BPCalculateDeltaE2000Array "
+        "BPImageFileExtractLab BPGetHtmlColorCode BPColorBookOpen BPColorBookClose BPColorBookGetName "
+        "BPColorBookGetColorCount "
+        "BPColorBookGetColorName BPColorBookGetColorCategory BPColorBookGetColorLab BPColorBookGetColorSRGB "
+        "BPColorBookGetColorLinearRGB BPColorBookGetColorTagCount BPColorBookGetColorTag "
+        "BPColorBookGetColorReflectanceCount BPColorBookGetColorReflectance BPPaletteListFind "
+        "BPPaletteListFree "
+        "BPPaletteListGetCount BPPaletteListGetName BPPaletteListGetPath BPPaletteListIsUser");
     for (std::string name; expected >> name;) EXPECT_EQ(names.count(name), 1u) << name;
 }
 

@@ -1,6 +1,6 @@
-/* An outside C program against the installed pigmo/bp.h: every conversion, difference, harmony
-   and catalogue export, checked against known values. Prints one line per failed check; exits 0 when all
-   pass. */
+/* An outside C program against the installed pigmo/bp.h: every conversion, difference, harmony,
+   catalogue, color-book and palette export, checked against known values. Prints one line per failed check;
+   exits 0 when all pass. */
 #include <math.h>
 #include <pigmo/bp.h>
 #include <stdio.h>
@@ -125,6 +125,19 @@ static void CheckDifferences(void) {
     };
     const double want[] = {5.0, 25.0, 3.42184, 3.50099, 5.44188, 5.52394, 5.50085, 2.0425, -1.0, -1.0};
     Check("differences", got, want, (int)(sizeof want / sizeof want[0]), 5e-5);
+
+    /* The array forms over the same pairs, laid row after row. */
+    const double firsts[12] = {50, 0, 0, 50, 20, -30, 50, 20, -30, 50, 2.6772, -79.7751};
+    const double seconds[12] = {50, 3, 4, 55, 18, -25, 55, 18, -25, 50, 0, -82.7485};
+    double rows[4];
+    CheckStatus("BPCalculateDeltaEArray", BPCalculateDeltaEArray(firsts, seconds, rows, 1), 1);
+    CheckStatus("BPCalculateDeltaECMCArray",
+                BPCalculateDeltaECMCArray(firsts + 3, seconds + 3, rows + 1, 1, 2, 1), 1);
+    CheckStatus("BPCalculateDeltaE94Array",
+                BPCalculateDeltaE94Array(firsts + 6, seconds + 6, rows + 2, 1, 1, 1, 1), 1);
+    CheckStatus("BPCalculateDeltaE2000Array",
+                BPCalculateDeltaE2000Array(firsts + 9, seconds + 9, rows + 3, 1, 1, 1, 1), 1);
+    Check("array differences", rows, (const double[]){5.0, 3.42184, 5.44188, 2.0425}, 4, 5e-5);
 }
 
 static void CheckHarmonies(void) {
@@ -191,12 +204,46 @@ static void CheckCatalogue(void) {
     CheckStatus("BPImageExtractLab empty", count, 0);
 }
 
+/* The installed copy finds its own centroid book and reads it. */
+static void CheckBooks(void) {
+    BPPaletteList* list = BPPaletteListFind();
+    const char* path = NULL;
+    for (int i = 0; i < BPPaletteListGetCount(list); ++i)
+        if (strcmp(BPPaletteListGetName(list, i), "ISCC-NBS Centroid Colors") == 0 &&
+            !BPPaletteListIsUser(list, i))
+            path = BPPaletteListGetPath(list, i);
+    if (path == NULL) {
+        printf("FAIL BPPaletteListFind: no system palette \"ISCC-NBS Centroid Colors\"\n");
+        ++failures;
+        BPPaletteListFree(list);
+        return;
+    }
+    char error[256] = "";
+    BPColorBook* book = BPColorBookOpen(path, error, sizeof error);
+    BPPaletteListFree(list);
+    CheckStatus("BPColorBookGetColorCount", BPColorBookGetColorCount(book), 267);
+    CheckText("BPColorBookGetColorName", BPColorBookGetColorName(book, 0), "Vivid Pink");
+    double lab[3], srgb[3];
+    CheckStatus("BPColorBookGetColorLab", BPColorBookGetColorLab(book, 0, lab), 1);
+    Check("BPColorBookGetColorLab", lab, BPCentroidGetLab(1), 3, 1e-4);
+    CheckStatus("BPColorBookGetColorSRGB", BPColorBookGetColorSRGB(book, 0, srgb), 1);
+    char code[8];
+    CheckStatus("BPGetHtmlColorCode", BPGetHtmlColorCode(srgb, code, sizeof code), 1);
+    CheckText("BPGetHtmlColorCode", code, "#FFB2A0");
+    BPColorBookClose(book);
+
+    CheckStatus("BPColorBookOpen(missing)", BPColorBookOpen("/nowhere/book.cxf", error, sizeof error) == NULL,
+                1);
+    CheckText("BPColorBookOpen(missing)", error, "ColorBook file '/nowhere/book.cxf' doesn't exist");
+}
+
 int main(void) {
     CheckConversions();
     CheckArrays();
     CheckDifferences();
     CheckHarmonies();
     CheckCatalogue();
+    CheckBooks();
     if (failures == 0) printf("bp exports ok\n");
     return failures == 0 ? 0 : 1;
 }

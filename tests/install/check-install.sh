@@ -14,7 +14,9 @@ fail() { echo "install check: $*" >&2; exit 1; }
 
 cmake --install "$build" --prefix "$prefix" >"$work/install.log" || { cat "$work/install.log" >&2; fail "cmake --install failed"; }
 for f in lib/libpigmo.so bin/pigmo include/pigmo/bp.h include/pigmo/engine/ColorTranslator.h include/pigmo/engine/ColorSpaceStruct.h \
-         lib/pkgconfig/pigmo.pc lib/cmake/Pigmo/PigmoConfig.cmake; do
+         lib/pkgconfig/pigmo.pc lib/cmake/Pigmo/PigmoConfig.cmake lib/python3/dist-packages/pigmo/__init__.py \
+         share/pigmo/blender/pigmo_colormap/__init__.py share/pigmo/blender/pigmo_colormap/pigmo/__init__.py \
+         share/pigmo/blender/pigmo_colormap.zip; do
   [ -e "$prefix/$f" ] || fail "$f is missing from the installed copy"
 done
 
@@ -52,4 +54,14 @@ listed=$(env -u PIGMO_INSTALL_LOCATION PATH="$prefix/bin:$PATH" pigmo palettes) 
 listed=$(env -u PIGMO_INSTALL_LOCATION bash -c 'exec -a /nowhere/bin/pigmo "$0" palettes' "$prefix/bin/pigmo") \
   || fail "pigmo palettes with a faked name failed"
 [[ $listed == *"$book"* ]] || fail "pigmo started as /nowhere/bin/pigmo listed: $listed"
-echo "installed copy: pkg-config and find_package builds work, palettes found from the installation"
+
+# The installed Python package loads the installed library by itself, with nothing pointing at it.
+preload=""
+# A sanitized library needs the sanitizer runtime loaded before Python starts.
+[ -n "$flags" ] && preload=$("$cxx" -print-file-name=libasan.so)
+got=$(cd "$work" && env -u PIGMO_LIBRARY PYTHONPATH="$prefix/lib/python3/dist-packages" LD_PRELOAD="$preload" \
+  ASAN_OPTIONS=detect_leaks=0 /usr/bin/python3 -c \
+  'import pigmo; print(*(f"{v:.2f}" for v in pigmo.lab_to_srgb((50, 0, 0))), pigmo.palettes()[0].name)') \
+  || fail "the installed Python package does not import"
+[ "$got" = "128.20 117.56 102.04 ISCC-NBS Centroid Colors" ] || fail "the installed Python package printed '$got'"
+echo "installed copy: pkg-config and find_package builds work, palettes found from the installation, Python package loads"

@@ -67,6 +67,18 @@ PIGMO_BP_API double BPCalculateDeltaE2000(const double* lab1, const double* lab2
 /* Square of the CIE76 difference, without the square root. */
 PIGMO_BP_API double BPCalculateDistanceSquared(const double* lab1, const double* lab2);
 
+/* The four differences over count pairs, row i of lab1 against row i of lab2 (three doubles a row),
+   into out (count doubles), each equal to the single-pair function's result: 1 on success, 0 without
+   writing anything when a pointer is null. */
+
+PIGMO_BP_API int BPCalculateDeltaEArray(const double* lab1, const double* lab2, double* out, size_t count);
+PIGMO_BP_API int BPCalculateDeltaECMCArray(const double* lab1, const double* lab2, double* out, size_t count,
+                                           double l, double c);
+PIGMO_BP_API int BPCalculateDeltaE94Array(const double* lab1, const double* lab2, double* out, size_t count,
+                                          double kL, double kC, double kH);
+PIGMO_BP_API int BPCalculateDeltaE2000Array(const double* lab1, const double* lab2, double* out, size_t count,
+                                            double kL, double kC, double kH);
+
 /* ISCC-NBS centroid catalogue and dominant colors */
 
 /* 267 centroids (1-based), each in one of 19 hue categories (1-based). Index arguments are
@@ -92,6 +104,13 @@ PIGMO_BP_API int BPCentroidGetForLab(const double* lab);
    height of 0 or less, gives a count of 0. */
 PIGMO_BP_API void BPImageExtractLab(const unsigned char* pixels, int width, int height, int colourCount,
                                     double* labOut, int* countOut);
+/* Dominant colors of a PNG, JPEG, BMP or TGA file, as BPImageExtractLab finds them in its pixels
+   (transparency ignored), without the repeats: writes up to colourCount (at least 1) triples to labOut
+   and their number to countOut (if not null). An image of more than maxPixels pixels is refused before
+   it is decoded. 1 on success; 0 with countOut 0 and the reason, naming the file, in errorText (cut to
+   errorTextSize bytes, terminator included; errorText may be null). */
+PIGMO_BP_API int BPImageFileExtractLab(const char* path, long long maxPixels, int colourCount, double* labOut,
+                                       int* countOut, char* errorText, size_t errorTextSize);
 
 /* Harmonies: companions of one L*, a*, b* color, rotated on a twelve-sector color wheel.
    Each returns the status of its last LCh-to-Lab conversion (1 success, 0 failure), or 0
@@ -107,6 +126,60 @@ PIGMO_BP_API int BPHarmonyGetFarNeighbor(const double* lab, double* lab1, double
 PIGMO_BP_API int BPHarmonyGetTriadic(const double* lab, double* lab1, double* lab2);
 /* Wheel angle +180 degrees. */
 PIGMO_BP_API int BPHarmonyGetComplement(const double* lab, double* labOut);
+
+/* The "#RRGGBB" code of gamma-encoded sRGB on 0..255: each channel truncated after adding 0.01 (the
+   error of a round trip through CIELAB), clamped to 0..255, red first. Writes at most codeSize bytes,
+   terminator included (8 hold the whole code); 1 on success, 0 for a null pointer or a codeSize of 0. */
+PIGMO_BP_API int BPGetHtmlColorCode(const double* sRGB, char* code, size_t codeSize);
+
+/* Color books: CxF 2.1 files read whole into a handle. A handle is never changed after it opens,
+   so several threads may read one at once; close it once, when no thread uses it any more. Texts
+   returned live as long as the handle. Every function takes a null handle or an index out of range
+   without harm: texts are then null, counts 0 and copies return 0. */
+
+typedef struct BPColorBook BPColorBook;
+
+/* Opens the book at path, or returns null and writes why into errorText (at most errorTextSize bytes,
+   terminator included; the text is cut to fit): the reader's message with the path and, where the
+   message hides it, the cause, e.g. "b.cxf: Specified file is not a valid CXF ColorBook (is a
+   directory)". errorText may be null. */
+PIGMO_BP_API BPColorBook* BPColorBookOpen(const char* path, char* errorText, size_t errorTextSize);
+PIGMO_BP_API void BPColorBookClose(BPColorBook* book);
+/* The first palette's "PaletteName", empty when the book has none. */
+PIGMO_BP_API const char* BPColorBookGetName(const BPColorBook* book);
+PIGMO_BP_API int BPColorBookGetColorCount(const BPColorBook* book);
+/* Fields of color index (0-based), with the values the book leaves out derived. */
+PIGMO_BP_API const char* BPColorBookGetColorName(const BPColorBook* book, int index);
+PIGMO_BP_API const char* BPColorBookGetColorCategory(const BPColorBook* book, int index);
+/* Copy three values: L*, a*, b* (D50); sRGB on 0..255; linear sRGB on 0..1 (what the map renders).
+   1 on success. */
+PIGMO_BP_API int BPColorBookGetColorLab(const BPColorBook* book, int index, double* lab);
+PIGMO_BP_API int BPColorBookGetColorSRGB(const BPColorBook* book, int index, double* sRGB);
+PIGMO_BP_API int BPColorBookGetColorLinearRGB(const BPColorBook* book, int index, double* linearRGB);
+PIGMO_BP_API int BPColorBookGetColorTagCount(const BPColorBook* book, int index);
+PIGMO_BP_API const char* BPColorBookGetColorTag(const BPColorBook* book, int index, int tag);
+/* Reflectance values in the book's order (36 are the bands 380 to 730 nm by 10 nm). The copy writes
+   at most capacity values and returns how many it wrote. */
+PIGMO_BP_API int BPColorBookGetColorReflectanceCount(const BPColorBook* book, int index);
+PIGMO_BP_API int BPColorBookGetColorReflectance(const BPColorBook* book, int index, double* values,
+                                                int capacity);
+
+/* Palettes found on this machine, as the palette list shows them: the system palettes, then the
+   user's, each in name order. The list is a snapshot taken when it is made; like a book it may be
+   read from several threads and is freed once. */
+
+typedef struct BPPaletteList BPPaletteList;
+
+/* Null only when memory runs out. */
+PIGMO_BP_API BPPaletteList* BPPaletteListFind(void);
+PIGMO_BP_API void BPPaletteListFree(BPPaletteList* list);
+PIGMO_BP_API int BPPaletteListGetCount(const BPPaletteList* list);
+/* The palette's "PaletteName"; empty when the file cannot be read as a book. */
+PIGMO_BP_API const char* BPPaletteListGetName(const BPPaletteList* list, int index);
+/* The file's full path. */
+PIGMO_BP_API const char* BPPaletteListGetPath(const BPPaletteList* list, int index);
+/* 1 for a user palette, 0 for a system palette, -1 for a null list or an index out of range. */
+PIGMO_BP_API int BPPaletteListIsUser(const BPPaletteList* list, int index);
 
 #ifdef __cplusplus
 }
