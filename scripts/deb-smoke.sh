@@ -20,8 +20,9 @@ deb=$(realpath "$build"/pigmo_*_amd64.deb)
 echo "deb-smoke: built $deb"
 dpkg-deb --field "$deb" Depends
 # Minimal images drop installed manuals, so the package itself is checked for them.
+contents=$(dpkg-deb --contents "$deb")
 for page in pigmo.1 pigmo-editor.1; do
-  dpkg-deb --contents "$deb" | grep -q "/usr/share/man/man1/$page" || { echo "deb-smoke: $page is not in the package" >&2; exit 1; }
+  grep -q "/usr/share/man/man1/$page" <<<"$contents" || { echo "deb-smoke: $page is not in the package" >&2; exit 1; }
 done
 
 state=$(mktemp -d)
