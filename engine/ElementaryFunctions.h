@@ -91,8 +91,41 @@ private:
     static constexpr Tables kTables{};
 };
 
+// Tables for the cube root: (1 + k / 512)^(-1/3) over the leading mantissa bits, 2^(-e/3) for
+// exponents e from -16 to 0.
+struct CubeRootTables {
+    static constexpr int kCellBits = 9;
+    static constexpr int kLowestExponent = -16;
+    std::array<double, (1 << kCellBits) + 1> mantissa{};
+    std::array<double, 1 - kLowestExponent> exponent{};
+    constexpr CubeRootTables() {
+        for (int k = 0; k <= (1 << kCellBits); ++k)
+            mantissa[k] = 1.0 / RootOfPower(1.0 + k * (1.0 / (1 << kCellBits)), 1, 3);
+        const double rootOfTwo = RootOfPower(2.0, 1, 3);
+        for (int e = kLowestExponent; e <= 0; ++e)
+            exponent[e - kLowestExponent] = IntegerPower(rootOfTwo, -e % 3) * IntegerPower(2.0, -e / 3);
+    }
+};
+inline constexpr CubeRootTables kCubeRootTables{};
+
+// x^(1/3) for 2^-16 <= x < 2 without a division, which would bound how many colors a batch converts
+// per unit of time: z ~ x^(-1/3) from the tables, then x^(1/3) = x z^2 (1 - e)^(-2/3) with
+// e = 1 - x z^3, by the binomial series to e^2 (e is below 1e-6).
 inline double CubeRoot(double x) {
-    return RationalPower<1, 3>::Of(x);
+    if (!(x >= 0x1p-16 && x < 2.0)) return std::cbrt(x);
+    constexpr int kFractionBits = 52 - CubeRootTables::kCellBits;
+    const uint64_t bits = std::bit_cast<uint64_t>(x);
+    const int exponent = static_cast<int>(bits >> 52) - 1023;
+    const uint64_t mantissa = bits & ((uint64_t{1} << 52) - 1);
+    const uint64_t cell = mantissa >> kFractionBits;
+    const double within = static_cast<double>(mantissa & ((uint64_t{1} << kFractionBits) - 1)) *
+                          (1.0 / static_cast<double>(uint64_t{1} << kFractionBits));
+    const double low = kCubeRootTables.mantissa[cell];
+    const double z = kCubeRootTables.exponent[exponent - CubeRootTables::kLowestExponent] *
+                     (low + within * (kCubeRootTables.mantissa[cell + 1] - low));
+    const double xz2 = x * (z * z);
+    const double e = 1.0 - xz2 * z;
+    return xz2 + xz2 * (e * (2.0 / 3.0 + e * (5.0 / 9.0)));
 }
 
 // a where the condition holds, else b, by bits rather than a branch: hues are random, so branches
