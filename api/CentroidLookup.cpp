@@ -125,13 +125,19 @@ int32_t cCentroidLookup::BoxOf(const Grid& grid, const double* lab) {
     return box;
 }
 
-cCentroidLookup::Candidates cCentroidLookup::CandidatesOf(const double* lab) const {
-    if (!std::isfinite(lab[0]) || !std::isfinite(lab[1]) || !std::isfinite(lab[2])) return {};
+cCentroidLookup::Place cCentroidLookup::PlaceOf(const double* lab) const {
+    if (!std::isfinite(lab[0]) || !std::isfinite(lab[1]) || !std::isfinite(lab[2])) return {-1, -1};
     const int32_t bucket = BucketOf(lab);
-    const Grid& grid = grids_[bucket];
-    const int32_t box = BoxOf(grid, lab);
-    if (box < 0) return {members_[bucket].data(), members_[bucket].data() + members_[bucket].size()};
-    return {grid.candidates.data() + grid.start[box], grid.candidates.data() + grid.start[box + 1]};
+    return {bucket, BoxOf(grids_[bucket], lab)};
+}
+
+cCentroidLookup::Candidates cCentroidLookup::CandidatesAt(Place place) const {
+    if (place.bucket < 0) return {};
+    const std::vector<int16_t>& members = members_[place.bucket];
+    if (place.box < 0) return {members.data(), members.data() + members.size()};
+    const Grid& grid = grids_[place.bucket];
+    return {grid.candidates.data() + grid.start[place.box],
+            grid.candidates.data() + grid.start[place.box + 1]};
 }
 
 int32_t cCentroidLookup::NearestOf(const double* lab, Candidates candidates) {
@@ -151,17 +157,23 @@ int32_t cCentroidLookup::NearestOf(const double* lab, Candidates candidates) {
 }
 
 int32_t cCentroidLookup::Nearest(const double* lab) const {
-    return NearestOf(lab, CandidatesOf(lab));
+    return NearestOf(lab, CandidatesAt(PlaceOf(lab)));
 }
 
 void cCentroidLookup::Nearest(const double (*labs)[3], size_t count, int32_t* nearest) const {
-    // All the table reads first: independent of each other, their cache misses overlap.
+    // Each level of table reads for the whole step before the next: independent of each other,
+    // their cache misses overlap.
     constexpr size_t kStep = 64;
+    Place places[kStep];
     Candidates candidates[kStep];
     for (size_t done = 0; done < count; done += kStep) {
         const size_t step = std::min(kStep, count - done);
         for (size_t i = 0; i < step; ++i) {
-            candidates[i] = CandidatesOf(labs[done + i]);
+            places[i] = PlaceOf(labs[done + i]);
+            if (places[i].box >= 0) __builtin_prefetch(&grids_[places[i].bucket].start[places[i].box]);
+        }
+        for (size_t i = 0; i < step; ++i) {
+            candidates[i] = CandidatesAt(places[i]);
             __builtin_prefetch(candidates[i].first);
         }
         for (size_t i = 0; i < step; ++i) nearest[done + i] = NearestOf(labs[done + i], candidates[i]);

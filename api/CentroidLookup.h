@@ -40,7 +40,13 @@ private:
         const int16_t* first = nullptr;
         const int16_t* last = nullptr;
     };
-    Candidates CandidatesOf(const double* lab) const;
+    // A color's bucket and box; bucket -1 when a component is not finite, box -1 beyond the grid.
+    struct Place {
+        int32_t bucket;
+        int32_t box;
+    };
+    Place PlaceOf(const double* lab) const;
+    Candidates CandidatesAt(Place place) const;
     static int32_t NearestOf(const double* lab, Candidates candidates);
 
     void BuildGrid(int32_t bucket);

@@ -20,25 +20,33 @@ struct Group {
     double distance = 1e20;
 };
 
-// BPConvertsRGB2Lab of 8-bit colors, to the last bit: the same sRGB and Lab steps, with the
-// transfer function looked up for the 256 values a channel can take.
+// BPConvertsRGB2Lab of 8-bit colors, to the last bit: the same sRGB and Lab steps, with each
+// channel's share of X, Y and Z looked up for the 256 values it can take. The matrix adds the
+// shares in channel order, and a share alone is what it gives for one channel with the others 0.
 class ByteSRGBToLab {
 public:
     ByteSRGBToLab() : lab_(cColorSpaceTable::DefaultDescription(ColorSpaceCode::Lab)) {
-        for (int v = 0; v < 256; ++v) linear_[v] = cColorSpaceSRGB::DecodeSRGB(v / 255.0);
+        for (int channel = 0; channel < 3; ++channel) {
+            for (int v = 0; v < 256; ++v) {
+                double linear[3] = {};
+                linear[channel] = cColorSpaceSRGB::DecodeSRGB(v / 255.0);
+                cColorSpaceSRGB::LinearToXYZ(linear, shares_[channel][v]);
+            }
+        }
     }
 
-    void Convert(uint32_t rgb, double* lab) const {
-        const double linear[3] = {linear_[rgb >> 16], linear_[(rgb >> 8) & 0xFF], linear_[rgb & 0xFF]};
-        double xyz[3];
-        cColorSpaceSRGB::LinearToXYZ(linear, xyz);
-        lab_.FromXYZ(xyz, lab);
+    void ToXYZ(uint32_t rgb, double* xyz) const {
+        const double* r = shares_[0][rgb >> 16];
+        const double* g = shares_[1][(rgb >> 8) & 0xFF];
+        const double* b = shares_[2][rgb & 0xFF];
+        for (int i = 0; i < 3; ++i) xyz[i] = r[i] + g[i] + b[i];
     }
+
+    const cColorSpaceLab& Lab() const { return lab_; }
 
 private:
-    double linear_[256];
-    // FromXYZ changes nothing, so threads share it; the node interface just is not const.
-    mutable cColorSpaceLab lab_;
+    double shares_[3][256][3];
+    cColorSpaceLab lab_;
 };
 
 // Counts of recently sampled colors in a direct-mapped table small enough for the caches. A color
@@ -95,7 +103,8 @@ private:
     [[gnu::noinline]] void AddRetired() {
         static const ByteSRGBToLab toLab;
         const cCentroidLookup& lookup = cCentroidLookup::Instance();
-        for (size_t i = 0; i < retiredCount_; ++i) toLab.Convert(retired_[i].rgb, labs_[i]);
+        for (size_t i = 0; i < retiredCount_; ++i) toLab.ToXYZ(retired_[i].rgb, xyzs_[i]);
+        toLab.Lab().FromXYZ(xyzs_, labs_, retiredCount_);
         lookup.Nearest(labs_, retiredCount_, centroids_);
         for (size_t i = 0; i < retiredCount_; ++i) {
             if (centroids_[i] < 1) continue;
@@ -116,6 +125,7 @@ private:
     Entry* recent_ = entries_.data();
     Entry retired_[kBatch];
     size_t retiredCount_ = 0;
+    double xyzs_[kBatch][3];
     double labs_[kBatch][3];
     int32_t centroids_[kBatch];
 };

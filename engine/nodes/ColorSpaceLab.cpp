@@ -12,6 +12,14 @@ constexpr double kXYZThreshold = 0.008856;
 double ForwardF(double t) {
     return t > kXYZThreshold ? Elementary::CubeRoot(t) : kSlope * t + kSixteenOver116;
 }
+
+// L*, a*, b* from fx, fy, fz, in place.
+void LabFromF(double* f) {
+    const double fx = f[0], fy = f[1], fz = f[2];
+    f[0] = 116.0 * fy - 16.0;
+    f[1] = 500.0 * (fx - fy);
+    f[2] = 200.0 * (fy - fz);
+}
 }  // namespace
 
 cColorSpaceLab::cColorSpaceLab(const ColorSpaceStruct& description) {
@@ -37,10 +45,13 @@ void cColorSpaceLab::ToXYZ(const double* in, double* out) {
 }
 
 void cColorSpaceLab::FromXYZ(const double* in, double* out) {
-    const double fx = ForwardF(in[0] / white_[0]);
-    const double fy = ForwardF(in[1] / white_[1]);
-    const double fz = ForwardF(in[2] / white_[2]);
-    out[0] = 116.0 * fy - 16.0;
-    out[1] = 500.0 * (fx - fy);
-    out[2] = 200.0 * (fy - fz);
+    for (int i = 0; i < 3; ++i) out[i] = ForwardF(in[i] / white_[i]);
+    LabFromF(out);
+}
+
+void cColorSpaceLab::FromXYZ(const double (*xyz)[3], double (*lab)[3], size_t count) const {
+    for (size_t n = 0; n < count; ++n) {
+        for (int i = 0; i < 3; ++i) lab[n][i] = ForwardF(xyz[n][i] / white_[i]);
+    }
+    for (size_t n = 0; n < count; ++n) LabFromF(lab[n]);
 }

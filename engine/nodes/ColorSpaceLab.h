@@ -9,6 +9,8 @@ public:
     explicit cColorSpaceLab(const ColorSpaceStruct& description);
     void ToXYZ(const double* in, double* out) override;
     void FromXYZ(const double* in, double* out) override;
+    // FromXYZ of many colors, each step over all of them: the colors' steps then overlap.
+    void FromXYZ(const double (*xyz)[3], double (*lab)[3], size_t count) const;
 
     const double* White() const { return white_; }
     // fx, fy, fz of an L*, a*, b* triple.
