@@ -12,14 +12,6 @@ constexpr double kXYZThreshold = 0.008856;
 double ForwardF(double t) {
     return t > kXYZThreshold ? Elementary::CubeRoot(t) : kSlope * t + kSixteenOver116;
 }
-
-// L*, a*, b* from fx, fy, fz, in place.
-void LabFromF(double* f) {
-    const double fx = f[0], fy = f[1], fz = f[2];
-    f[0] = 116.0 * fy - 16.0;
-    f[1] = 500.0 * (fx - fy);
-    f[2] = 200.0 * (fy - fz);
-}
 }  // namespace
 
 cColorSpaceLab::cColorSpaceLab(const ColorSpaceStruct& description) {
@@ -45,13 +37,17 @@ void cColorSpaceLab::ToXYZ(const double* in, double* out) {
 }
 
 void cColorSpaceLab::FromXYZ(const double* in, double* out) {
-    for (int i = 0; i < 3; ++i) out[i] = ForwardF(in[i] / white_[i]);
-    LabFromF(out);
+    FromXYZ(reinterpret_cast<const double(*)[3]>(in), reinterpret_cast<double(*)[3]>(out), 1);
 }
 
 void cColorSpaceLab::FromXYZ(const double (*xyz)[3], double (*lab)[3], size_t count) const {
     for (size_t n = 0; n < count; ++n) {
         for (int i = 0; i < 3; ++i) lab[n][i] = ForwardF(xyz[n][i] / white_[i]);
     }
-    for (size_t n = 0; n < count; ++n) LabFromF(lab[n]);
+    for (size_t n = 0; n < count; ++n) {
+        const double fx = lab[n][0], fy = lab[n][1], fz = lab[n][2];
+        lab[n][0] = 116.0 * fy - 16.0;
+        lab[n][1] = 500.0 * (fx - fy);
+        lab[n][2] = 200.0 * (fy - fz);
+    }
 }

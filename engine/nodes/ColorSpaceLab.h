@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+
 #include "ColorSpace.h"
 #include "ColorSpaceStruct.h"
 
