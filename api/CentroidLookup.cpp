@@ -29,7 +29,7 @@ constexpr int32_t kNearBZero[] = {
 // Grid boxes: L* from 0 to 100, a* and b* from -128 to 128, each halved at its border.
 constexpr double kGridLow[3] = {0.0, -128.0, -128.0};
 constexpr double kGridHalf[3] = {50.0, 128.0, 128.0};
-constexpr int32_t kGridCells[3] = {8, 12, 12};  // per half
+constexpr int32_t kGridCells[3] = {16, 24, 24};  // per half
 // Kept candidates may exceed the bound by this much, so rounding at box edges loses none.
 constexpr double kSlack = 1e-6;
 
@@ -125,30 +125,59 @@ int32_t cCentroidLookup::BoxOf(const Grid& grid, const double* lab) {
     return box;
 }
 
-int32_t cCentroidLookup::Nearest(const double* lab) const {
-    if (!std::isfinite(lab[0]) || !std::isfinite(lab[1]) || !std::isfinite(lab[2])) return -1;
+cCentroidLookup::Place cCentroidLookup::PlaceOf(const double* lab) const {
+    if (!std::isfinite(lab[0]) || !std::isfinite(lab[1]) || !std::isfinite(lab[2])) return {-1, -1};
     const int32_t bucket = BucketOf(lab);
-    const Grid& grid = grids_[bucket];
-    const int32_t box = BoxOf(grid, lab);
-    const int16_t* first = members_[bucket].data();
-    const int16_t* last = first + members_[bucket].size();
-    if (box >= 0) {
-        first = grid.candidates.data() + grid.start[box];
-        last = grid.candidates.data() + grid.start[box + 1];
-    }
-    if (first == last) return -1;
+    return {bucket, BoxOf(grids_[bucket], lab)};
+}
+
+cCentroidLookup::Candidates cCentroidLookup::CandidatesAt(Place place) const {
+    if (place.bucket < 0) return {};
+    const std::vector<int16_t>& members = members_[place.bucket];
+    if (place.box < 0) return {members.data(), members.data() + members.size()};
+    const Grid& grid = grids_[place.bucket];
+    return {grid.candidates.data() + grid.start[place.box],
+            grid.candidates.data() + grid.start[place.box + 1]};
+}
+
+int32_t cCentroidLookup::NearestOf(const double* lab, Candidates candidates) {
+    if (candidates.first == candidates.last) return -1;
     // In index order, only a strictly smaller distance replaces the best, so ties keep the lower
     // index; the first candidate is taken even when a far color's distance overflows. Selected
     // without branches: which candidate wins is as good as random.
-    double best = DistanceSquared(lab, kIsccNbsCentroids[*first - 1].lab);
-    int32_t result = *first;
-    for (const int16_t* index = first + 1; index != last; ++index) {
+    double best = DistanceSquared(lab, kIsccNbsCentroids[*candidates.first - 1].lab);
+    int32_t result = *candidates.first;
+    for (const int16_t* index = candidates.first + 1; index != candidates.last; ++index) {
         const double distance = DistanceSquared(lab, kIsccNbsCentroids[*index - 1].lab);
         const int32_t closer = distance < best;
         best = std::min(best, distance);
         result += (*index - result) & -closer;
     }
     return result;
+}
+
+int32_t cCentroidLookup::Nearest(const double* lab) const {
+    return NearestOf(lab, CandidatesAt(PlaceOf(lab)));
+}
+
+void cCentroidLookup::Nearest(const double (*labs)[3], size_t count, int32_t* nearest) const {
+    // Each level of table reads for the whole step before the next: independent of each other,
+    // their cache misses overlap.
+    constexpr size_t kStep = 64;
+    Place places[kStep];
+    Candidates candidates[kStep];
+    for (size_t done = 0; done < count; done += kStep) {
+        const size_t step = std::min(kStep, count - done);
+        for (size_t i = 0; i < step; ++i) {
+            places[i] = PlaceOf(labs[done + i]);
+            if (places[i].box >= 0) __builtin_prefetch(&grids_[places[i].bucket].start[places[i].box]);
+        }
+        for (size_t i = 0; i < step; ++i) {
+            candidates[i] = CandidatesAt(places[i]);
+            __builtin_prefetch(candidates[i].first);
+        }
+        for (size_t i = 0; i < step; ++i) nearest[done + i] = NearestOf(labs[done + i], candidates[i]);
+    }
 }
 
 extern "C" int BPCentroidGetForLab(const double* lab) {

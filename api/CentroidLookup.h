@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <cstddef>
 #include <cstdint>
 #include <vector>
 
@@ -19,6 +20,8 @@ public:
     // 1-based centroid index with the smallest squared CIE76 distance, the lower index on
     // ties; -1 when a component is not finite.
     int32_t Nearest(const double* lab) const;
+    // Nearest of each of `count` colors, faster than one at a time.
+    void Nearest(const double (*labs)[3], size_t count, int32_t* nearest) const;
 
 private:
     cCentroidLookup();
@@ -31,6 +34,20 @@ private:
         std::vector<uint32_t> start;  // per box, into candidates; one extra at the end
         std::vector<int16_t> candidates;
     };
+
+    // The centroids that can be nearest to a color, in index order; none when it is not finite.
+    struct Candidates {
+        const int16_t* first = nullptr;
+        const int16_t* last = nullptr;
+    };
+    // A color's bucket and box; bucket -1 when a component is not finite, box -1 beyond the grid.
+    struct Place {
+        int32_t bucket;
+        int32_t box;
+    };
+    Place PlaceOf(const double* lab) const;
+    Candidates CandidatesAt(Place place) const;
+    static int32_t NearestOf(const double* lab, Candidates candidates);
 
     void BuildGrid(int32_t bucket);
     // Box of a color inside the grid, or -1 when it lies beyond.

@@ -12,96 +12,6 @@
 
 namespace {
 
-// The distinct sampled colors, how often each occurs and the latest position at which it occurs
-// in sampling order. Converting each distinct color once instead of every sample is what makes
-// large images affordable: photographs repeat their colors many times over.
-class ColorTally {
-public:
-    struct Entry {
-        uint32_t rgb = kEmpty;
-        uint32_t count = 0;
-        uint64_t last = 0;
-    };
-
-    ColorTally() : slots_(size_t{1} << kInitialBits) {}
-
-    // False when the table has reached its size limit or a count its maximum; Clear it before
-    // adding more.
-    bool Add(uint32_t rgb, uint64_t position) {
-        if (rgb != recent_) {
-            const size_t slot = Find(rgb);
-            if (slot == kFull) return false;
-            recent_ = rgb;
-            recentSlot_ = slot;
-        }
-        Entry& entry = slots_[recentSlot_];
-        if (entry.count == UINT32_MAX) return false;
-        ++entry.count;
-        entry.last = std::max(entry.last, position);
-        return true;
-    }
-
-    // Starts loading the slot a color will probe first; the table outgrows the caches.
-    void Prefetch(uint32_t rgb) const { __builtin_prefetch(&slots_[Home(rgb)]); }
-
-    const std::vector<Entry>& Slots() const { return slots_; }
-
-    void Clear() {
-        std::fill(slots_.begin(), slots_.end(), Entry{});
-        used_ = 0;
-        recent_ = kEmpty;
-    }
-
-private:
-    static constexpr uint32_t kEmpty = 0xFFFFFFFFu;
-    static constexpr size_t kFull = ~size_t{0};
-    static constexpr int kInitialBits = 10;
-    // 8 MB of slots: noise-like images are converted in several rounds instead of growing further.
-    static constexpr int kMaximumBits = 19;
-
-    // Fibonacci hashing: the high bits of the product mix all three channels.
-    size_t Home(uint32_t rgb) const { return (rgb * 0x9E3779B97F4A7C15ull) >> (64 - bits_); }
-
-    size_t Find(uint32_t rgb) {
-        const size_t mask = slots_.size() - 1;
-        size_t slot = Home(rgb);
-        while (slots_[slot].rgb != rgb) {
-            if (slots_[slot].rgb == kEmpty) {
-                // Kept at most half full so probe runs stay short.
-                if (2 * (used_ + 1) > slots_.size()) {
-                    if (bits_ == kMaximumBits) return kFull;
-                    Grow();
-                    return Find(rgb);
-                }
-                slots_[slot].rgb = rgb;
-                ++used_;
-                return slot;
-            }
-            slot = (slot + 1) & mask;
-        }
-        return slot;
-    }
-
-    void Grow() {
-        std::vector<Entry> old(slots_.size() * 2);
-        old.swap(slots_);
-        ++bits_;
-        const size_t mask = slots_.size() - 1;
-        for (const Entry& entry : old) {
-            if (entry.rgb == kEmpty) continue;
-            size_t slot = Home(entry.rgb);
-            while (slots_[slot].rgb != kEmpty) slot = (slot + 1) & mask;
-            slots_[slot] = entry;
-        }
-    }
-
-    std::vector<Entry> slots_;
-    int bits_ = kInitialBits;
-    size_t used_ = 0;
-    uint32_t recent_ = kEmpty;
-    size_t recentSlot_ = 0;
-};
-
 // The samples that fell to one centroid.
 struct Group {
     uint64_t count = 0;
@@ -110,44 +20,115 @@ struct Group {
     double distance = 1e20;
 };
 
-// BPConvertsRGB2Lab of 8-bit colors, to the last bit: the same sRGB and Lab steps, with the
-// transfer function looked up for the 256 values a channel can take.
+// BPConvertsRGB2Lab of 8-bit colors, to the last bit: the same sRGB and Lab steps, with each
+// channel's share of X, Y and Z looked up for the 256 values it can take. The matrix adds the
+// shares in channel order, and a share alone is what it gives for one channel with the others 0.
 class ByteSRGBToLab {
 public:
     ByteSRGBToLab() : lab_(cColorSpaceTable::DefaultDescription(ColorSpaceCode::Lab)) {
-        for (int v = 0; v < 256; ++v) linear_[v] = cColorSpaceSRGB::DecodeSRGB(v / 255.0);
+        for (int channel = 0; channel < 3; ++channel) {
+            for (int v = 0; v < 256; ++v) {
+                double linear[3] = {};
+                linear[channel] = cColorSpaceSRGB::DecodeSRGB(v / 255.0);
+                cColorSpaceSRGB::LinearToXYZ(linear, shares_[channel][v]);
+            }
+        }
     }
 
-    void Convert(uint32_t rgb, double* lab) const {
-        const double linear[3] = {linear_[rgb >> 16], linear_[(rgb >> 8) & 0xFF], linear_[rgb & 0xFF]};
-        double xyz[3];
-        cColorSpaceSRGB::LinearToXYZ(linear, xyz);
-        lab_.FromXYZ(xyz, lab);
+    void ToXYZ(uint32_t rgb, double* xyz) const {
+        const double* r = shares_[0][rgb >> 16];
+        const double* g = shares_[1][(rgb >> 8) & 0xFF];
+        const double* b = shares_[2][rgb & 0xFF];
+        for (int i = 0; i < 3; ++i) xyz[i] = r[i] + g[i] + b[i];
+    }
+
+    const cColorSpaceLab& Lab() const { return lab_; }
+
+private:
+    double shares_[3][256][3];
+    cColorSpaceLab lab_;
+};
+
+// Counts of recently sampled colors in a direct-mapped table small enough for the caches. A color
+// goes to its group, converted once for all its samples, when another color takes its slot:
+// photographs repeat nearby colors many times over, and noise that repeats nothing pays a probe.
+class RecentColors {
+public:
+    explicit RecentColors(std::vector<Group>& groups) : groups_(groups), entries_(size_t{1} << kBits) {}
+
+    // Starts loading a color's slot ahead of its Add; the table outgrows the first-level cache.
+    void Prefetch(uint32_t rgb) const { __builtin_prefetch(&entries_[Slot(rgb)]); }
+
+    void Add(uint32_t rgb, uint64_t position) {
+        // Runs of one color skip the probe.
+        if (rgb != recent_->rgb) {
+            recent_ = &entries_[Slot(rgb)];
+            if (recent_->rgb != rgb) {
+                Retire(*recent_);
+                *recent_ = Entry{rgb, 0, 0};
+            }
+        }
+        Entry& entry = *recent_;
+        entry.last = std::max(entry.last, position);
+        if (++entry.count == UINT32_MAX) {
+            Retire(entry);
+            entry = Entry{rgb, 0, 0};
+        }
+    }
+
+    // Hands every color still counted to its group.
+    void Finish() {
+        for (Entry& entry : entries_) Retire(entry);
+        AddRetired();
     }
 
 private:
-    double linear_[256];
-    // FromXYZ changes nothing, so threads share it; the node interface just is not const.
-    mutable cColorSpaceLab lab_;
-};
+    struct Entry {
+        uint32_t rgb = kEmpty;
+        uint32_t count = 0;
+        uint64_t last = 0;
+    };
 
-// Adds the tallied colors to the groups of their nearest centroids, as Lab sums until averaged.
-void AddToGroups(const ColorTally& tally, std::vector<Group>& groups) {
-    static const ByteSRGBToLab toLab;
-    const cCentroidLookup& lookup = cCentroidLookup::Instance();
-    for (const ColorTally::Entry& entry : tally.Slots()) {
-        if (entry.count == 0) continue;
-        double lab[3];
-        toLab.Convert(entry.rgb, lab);
-        const int32_t index = lookup.Nearest(lab);
-        if (index < 1) continue;
-        Group& group = groups[index - 1];
-        group.count += entry.count;
-        group.last = std::max(group.last, entry.last);
-        const double weight = static_cast<double>(entry.count);
-        for (int i = 0; i < 3; ++i) group.lab[i] += weight * lab[i];
+    static size_t Slot(uint32_t rgb) { return (rgb * 0x9E3779B1u) >> (32 - kBits); }
+
+    void Retire(const Entry& entry) {
+        if (entry.count == 0) return;
+        retired_[retiredCount_++] = entry;
+        if (retiredCount_ == kBatch) AddRetired();
     }
-}
+
+    // Retired colors go to their groups in batches, one step at a time over the batch: the
+    // conversions of different colors then overlap instead of waiting on each other's searches.
+    // Kept out of line so that Add, run for every sample, stays small enough to inline.
+    [[gnu::noinline]] void AddRetired() {
+        static const ByteSRGBToLab toLab;
+        const cCentroidLookup& lookup = cCentroidLookup::Instance();
+        for (size_t i = 0; i < retiredCount_; ++i) toLab.ToXYZ(retired_[i].rgb, xyzs_[i]);
+        toLab.Lab().FromXYZ(xyzs_, labs_, retiredCount_);
+        lookup.Nearest(labs_, retiredCount_, centroids_);
+        for (size_t i = 0; i < retiredCount_; ++i) {
+            if (centroids_[i] < 1) continue;
+            Group& group = groups_[centroids_[i] - 1];
+            group.count += retired_[i].count;
+            group.last = std::max(group.last, retired_[i].last);
+            const double weight = static_cast<double>(retired_[i].count);
+            for (int c = 0; c < 3; ++c) group.lab[c] += weight * labs_[i][c];
+        }
+        retiredCount_ = 0;
+    }
+
+    static constexpr uint32_t kEmpty = 0xFFFFFFFFu;  // no 24-bit color
+    static constexpr int kBits = 15;
+    static constexpr size_t kBatch = 64;
+    std::vector<Group>& groups_;
+    std::vector<Entry> entries_;
+    Entry* recent_ = entries_.data();
+    Entry retired_[kBatch];
+    size_t retiredCount_ = 0;
+    double xyzs_[kBatch][3];
+    double labs_[kBatch][3];
+    int32_t centroids_[kBatch];
+};
 
 uint32_t ColorAt(const unsigned char* row, int x) {
     const unsigned char* pixel = row + static_cast<size_t>(x) * 4;
@@ -159,24 +140,18 @@ uint32_t ColorAt(const unsigned char* row, int x) {
 // computed instead, since only the tie between equally large groups depends on it.
 void SampleIntoGroups(const unsigned char* pixels, int width, int height, std::vector<Group>& groups) {
     constexpr int kAhead = 32;  // pixels, 16 samples
-    ColorTally tally;
+    RecentColors recent(groups);
     const uint64_t rowsSampled = (static_cast<uint64_t>(height) + 1) / 2;
     for (int y = height - 1; y >= 0; y -= 2) {
         const unsigned char* row = pixels + static_cast<size_t>(y) * static_cast<size_t>(width) * 4;
         const uint64_t rowPlace = static_cast<uint64_t>(height - 1 - y) / 2;
         uint64_t column = 0;
         for (int x = width - 1; x >= 0; x -= 2, ++column) {
-            if (x >= kAhead) tally.Prefetch(ColorAt(row, x - kAhead));
-            const uint32_t rgb = ColorAt(row, x);
-            const uint64_t position = column * rowsSampled + rowPlace;
-            if (!tally.Add(rgb, position)) {
-                AddToGroups(tally, groups);
-                tally.Clear();
-                tally.Add(rgb, position);
-            }
+            if (x >= kAhead) recent.Prefetch(ColorAt(row, x - kAhead));
+            recent.Add(ColorAt(row, x), column * rowsSampled + rowPlace);
         }
     }
-    AddToGroups(tally, groups);
+    recent.Finish();
 }
 
 // Averages the groups and writes the means of `wanted` of them, largest group first, then

@@ -200,16 +200,45 @@ int32_t cColorTranslator::Build() {
     return 0;
 }
 
+namespace {
+// Colors of three channels, one after the other, as rows of three.
+const double (*Triples(const double* values))[3] {
+    return reinterpret_cast<const double(*)[3]>(values);
+}
+double (*Triples(double* values))[3] {
+    return reinterpret_cast<double(*)[3]>(values);
+}
+}  // namespace
+
 template <class From, class To>
 void cColorTranslator::ThroughXYZ(cColorTranslator& translator, const double* in, double* out, size_t count) {
     From& first = static_cast<From&>(*translator.nodes_[0]);
     To& last = static_cast<To&>(*translator.nodes_[1]);
     const size_t inWidth = translator.inputBuffer_.size();
-    for (size_t i = 0; i < count; ++i, in += inWidth, out += translator.outputWidth_) {
-        double xyz[3] = {0.0, 0.0, 0.0};  // an inert spectral node writes nothing
-        first.From::ToXYZ(in, xyz);
-        translator.Adapt(xyz);
-        last.To::FromXYZ(xyz, out);
+    const size_t outWidth = translator.outputWidth_;
+    // A block at a time, each step over the whole block: one color's step no longer waits for the
+    // step before it, so the processor overlaps the steps of neighbouring colors. Nodes with a
+    // step for many colors of three channels run it over the block at once.
+    constexpr size_t kBlock = 16;
+    double xyz[kBlock][3];
+    for (size_t done = 0; done < count; done += kBlock) {
+        const size_t block = std::min(kBlock, count - done);
+        const double* blockIn = in + done * inWidth;
+        double* blockOut = out + done * outWidth;
+        if constexpr (requires { first.ToXYZ(Triples(blockIn), xyz, block); }) {
+            first.ToXYZ(Triples(blockIn), xyz, block);
+        } else {
+            for (size_t i = 0; i < block; ++i) {
+                xyz[i][0] = xyz[i][1] = xyz[i][2] = 0.0;  // an inert spectral node writes nothing
+                first.From::ToXYZ(blockIn + i * inWidth, xyz[i]);
+            }
+        }
+        for (size_t i = 0; i < block; ++i) translator.Adapt(xyz[i]);
+        if constexpr (requires { last.FromXYZ(xyz, Triples(blockOut), block); }) {
+            last.FromXYZ(xyz, Triples(blockOut), block);
+        } else {
+            for (size_t i = 0; i < block; ++i) last.To::FromXYZ(xyz[i], blockOut + i * outWidth);
+        }
     }
 }
 

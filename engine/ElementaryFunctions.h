@@ -45,22 +45,35 @@ constexpr double RootOfPower(double v, int p, int q) {
     return y;
 }
 
-// x^(P/Q) for 2^-16 <= x < 2: a first guess from tables over the exponent and the leading mantissa
-// bits, then one Halley step on y^Q = x^P.
+// Table-driven powers of x for 2^-16 <= x < 2: x = 2^e m, the power of m interpolated linearly
+// between entries for m = 1 + k / 512, times the entry of the exponent e.
+constexpr int kGuessCellBits = 9;
+constexpr int kGuessLowestExponent = -16;
+struct GuessTables {
+    std::array<double, (1 << kGuessCellBits) + 1> mantissa{};
+    std::array<double, 1 - kGuessLowestExponent> exponent{};
+};
+
+inline double TableGuess(const GuessTables& tables, double x) {
+    constexpr int kFractionBits = 52 - kGuessCellBits;
+    const uint64_t bits = std::bit_cast<uint64_t>(x);
+    const int exponent = static_cast<int>(bits >> 52) - 1023;
+    const uint64_t mantissa = bits & ((uint64_t{1} << 52) - 1);
+    const uint64_t cell = mantissa >> kFractionBits;
+    const double within = static_cast<double>(mantissa & ((uint64_t{1} << kFractionBits) - 1)) *
+                          (1.0 / static_cast<double>(uint64_t{1} << kFractionBits));
+    const double low = tables.mantissa[cell];
+    return tables.exponent[exponent - kGuessLowestExponent] *
+           (low + within * (tables.mantissa[cell + 1] - low));
+}
+
+// x^(P/Q) for 2^-16 <= x < 2: a first guess from the tables, then one Halley step on y^Q = x^P.
 template <int P, int Q>
 class RationalPower {
 public:
     static double Of(double x) {
         if (!(x >= 0x1p-16 && x < 2.0)) return std::pow(x, static_cast<double>(P) / Q);
-        const uint64_t bits = std::bit_cast<uint64_t>(x);
-        const int exponent = static_cast<int>(bits >> 52) - 1023;
-        const uint64_t mantissa = bits & ((uint64_t{1} << 52) - 1);
-        const uint64_t cell = mantissa >> kFractionBits;
-        const double within = static_cast<double>(mantissa & ((uint64_t{1} << kFractionBits) - 1)) *
-                              (1.0 / static_cast<double>(uint64_t{1} << kFractionBits));
-        const double low = kTables.mantissa[cell];
-        const double guess = low + within * (kTables.mantissa[cell + 1] - low);
-        double y = kTables.exponent[exponent - kLowestExponent] * guess;
+        double y = TableGuess(kTables, x);
         const double xp = IntegerPower<P>(x);
         const double yq = IntegerPower<Q>(y);
         y += y * (2.0 * (xp - yq) / ((Q + 1) * yq + (Q - 1) * xp));
@@ -68,31 +81,45 @@ public:
     }
 
 private:
-    static constexpr int kCellBits = 9;
-    static constexpr int kFractionBits = 52 - kCellBits;
-    static constexpr int kLowestExponent = -16;
-
-    struct Tables {
-        std::array<double, (1 << kCellBits) + 1> mantissa{};  // (1 + k / 512)^(P/Q)
-        std::array<double, 1 - kLowestExponent> exponent{};   // 2^(e P / Q) for e from -16 to 0
-        constexpr Tables() {
-            for (int k = 0; k <= (1 << kCellBits); ++k)
-                mantissa[k] = RootOfPower(1.0 + k * (1.0 / (1 << kCellBits)), P, Q);
-            // 2^(eP/Q) as 2^whole times the Q-th root of 2 raised to the remainder.
-            const double rootOfTwo = RootOfPower(2.0, 1, Q);
-            for (int e = kLowestExponent; e <= 0; ++e) {
-                int whole = e * P / Q;
-                if (whole * Q > e * P) --whole;
-                exponent[e - kLowestExponent] =
-                    IntegerPower(rootOfTwo, e * P - whole * Q) * IntegerPower(0.5, -whole);
-            }
+    // (1 + k / 512)^(P/Q), and 2^(eP/Q) as 2^whole times the Q-th root of 2 raised to the remainder.
+    static constexpr GuessTables MakeTables() {
+        GuessTables tables;
+        for (int k = 0; k <= (1 << kGuessCellBits); ++k)
+            tables.mantissa[k] = RootOfPower(1.0 + k * (1.0 / (1 << kGuessCellBits)), P, Q);
+        const double rootOfTwo = RootOfPower(2.0, 1, Q);
+        for (int e = kGuessLowestExponent; e <= 0; ++e) {
+            int whole = e * P / Q;
+            if (whole * Q > e * P) --whole;
+            tables.exponent[e - kGuessLowestExponent] =
+                IntegerPower(rootOfTwo, e * P - whole * Q) * IntegerPower(0.5, -whole);
         }
-    };
-    static constexpr Tables kTables{};
+        return tables;
+    }
+    static constexpr GuessTables kTables = MakeTables();
 };
 
+// (1 + k / 512)^(-1/3) and 2^(-e/3).
+constexpr GuessTables MakeInverseCubeRootTables() {
+    GuessTables tables;
+    for (int k = 0; k <= (1 << kGuessCellBits); ++k)
+        tables.mantissa[k] = 1.0 / RootOfPower(1.0 + k * (1.0 / (1 << kGuessCellBits)), 1, 3);
+    const double rootOfTwo = RootOfPower(2.0, 1, 3);
+    for (int e = kGuessLowestExponent; e <= 0; ++e)
+        tables.exponent[e - kGuessLowestExponent] =
+            IntegerPower(rootOfTwo, -e % 3) * IntegerPower(2.0, -e / 3);
+    return tables;
+}
+inline constexpr GuessTables kInverseCubeRootTables = MakeInverseCubeRootTables();
+
+// x^(1/3) for 2^-16 <= x < 2 without a division, which would bound how many colors a batch converts
+// per unit of time: z ~ x^(-1/3) from the tables, then x^(1/3) = x z^2 (1 - e)^(-2/3) with
+// e = 1 - x z^3, by the binomial series to e^2 (e is below 1e-6).
 inline double CubeRoot(double x) {
-    return RationalPower<1, 3>::Of(x);
+    if (!(x >= 0x1p-16 && x < 2.0)) return std::cbrt(x);
+    const double z = TableGuess(kInverseCubeRootTables, x);
+    const double xz2 = x * (z * z);
+    const double e = 1.0 - xz2 * z;
+    return xz2 + xz2 * (e * (2.0 / 3.0 + e * (5.0 / 9.0)));
 }
 
 // a where the condition holds, else b, by bits rather than a branch: hues are random, so branches

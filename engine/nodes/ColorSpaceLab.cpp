@@ -37,10 +37,17 @@ void cColorSpaceLab::ToXYZ(const double* in, double* out) {
 }
 
 void cColorSpaceLab::FromXYZ(const double* in, double* out) {
-    const double fx = ForwardF(in[0] / white_[0]);
-    const double fy = ForwardF(in[1] / white_[1]);
-    const double fz = ForwardF(in[2] / white_[2]);
-    out[0] = 116.0 * fy - 16.0;
-    out[1] = 500.0 * (fx - fy);
-    out[2] = 200.0 * (fy - fz);
+    FromXYZ(reinterpret_cast<const double(*)[3]>(in), reinterpret_cast<double(*)[3]>(out), 1);
+}
+
+void cColorSpaceLab::FromXYZ(const double (*xyz)[3], double (*lab)[3], size_t count) const {
+    for (size_t n = 0; n < count; ++n) {
+        for (int i = 0; i < 3; ++i) lab[n][i] = ForwardF(xyz[n][i] / white_[i]);
+    }
+    for (size_t n = 0; n < count; ++n) {
+        const double fx = lab[n][0], fy = lab[n][1], fz = lab[n][2];
+        lab[n][0] = 116.0 * fy - 16.0;
+        lab[n][1] = 500.0 * (fx - fy);
+        lab[n][2] = 200.0 * (fy - fz);
+    }
 }

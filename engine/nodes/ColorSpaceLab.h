@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+
 #include "ColorSpace.h"
 #include "ColorSpaceStruct.h"
 
@@ -9,6 +11,8 @@ public:
     explicit cColorSpaceLab(const ColorSpaceStruct& description);
     void ToXYZ(const double* in, double* out) override;
     void FromXYZ(const double* in, double* out) override;
+    // FromXYZ of many colors, each step over all of them: the colors' steps then overlap.
+    void FromXYZ(const double (*xyz)[3], double (*lab)[3], size_t count) const;
 
     const double* White() const { return white_; }
     // fx, fy, fz of an L*, a*, b* triple.

@@ -42,9 +42,14 @@ void cColorSpaceSRGB::White(double* white) {
 }
 
 void cColorSpaceSRGB::ToXYZ(const double* in, double* out) {
-    const double linear[3] = {DecodeSRGB(in[0] / 255.0), DecodeSRGB(in[1] / 255.0),
-                              DecodeSRGB(in[2] / 255.0)};
-    LinearToXYZ(linear, out);
+    ToXYZ(reinterpret_cast<const double(*)[3]>(in), reinterpret_cast<double(*)[3]>(out), 1);
+}
+
+void cColorSpaceSRGB::ToXYZ(const double (*in)[3], double (*xyz)[3], size_t count) const {
+    for (size_t n = 0; n < count; ++n) {
+        for (int i = 0; i < 3; ++i) xyz[n][i] = DecodeSRGB(in[n][i] / 255.0);
+    }
+    for (size_t n = 0; n < count; ++n) LinearToXYZ(xyz[n], xyz[n]);
 }
 
 void cColorSpaceSRGB::FromXYZ(const double* in, double* out) {
