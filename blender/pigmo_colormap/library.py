@@ -62,8 +62,10 @@ def pigmo() -> Optional[ModuleType]:
     try:
         _loaded = importlib.import_module(".pigmo", __package__)
     except ImportError as error:
-        looked = ", ".join(str(place) for place in places)
-        _problem = f"Pigmo library not found (looked at {looked}): {error}"
+        if found is None:
+            _problem = f"{LIBRARY_NAME} not found; looked at " + ", ".join(str(place) for place in places)
+        else:
+            _problem = f"{found} cannot be used: {error}"
     return _loaded
 
 

@@ -141,7 +141,8 @@ def draw_pick(layout, pick):
     for label, value in (
         ("Category", pick["category"]),
         ("L*a*b*", f"{lab[0]:.2f}  {lab[1]:.2f}  {lab[2]:.2f}"),
-        ("sRGB", f"{srgb[0]:.1f}  {srgb[1]:.1f}  {srgb[2]:.1f}   {pick['html']}"),
+        ("sRGB", f"{srgb[0]:.1f}  {srgb[1]:.1f}  {srgb[2]:.1f}"),
+        ("Hex", pick["html"]),
         ("Linear RGB", f"{linear[0]:.4f}  {linear[1]:.4f}  {linear[2]:.4f}"),
         ("Tags", ", ".join(pick["tags"]) or "none"),
     ):

@@ -2,7 +2,6 @@
 #include <pigmo/bp.h>
 
 #include <atomic>
-#include <cstdio>
 #include <cstring>
 #include <filesystem>
 #include <string>
@@ -169,27 +168,6 @@ TEST_F(BookInterface, OpensOnManyThreadsWithTheirOwnMessages) {
     EXPECT_EQ(wrong.load(), 0);
 }
 
-// The shipped centroid book against the catalogue: each color's tag "centroid N" names its entry.
-TEST(BookInterfaceShipped, ReadsTheCentroidBook) {
-    BPColorBook* book = BPColorBookOpen(PIGMO_PALETTE_SOURCE_DIR "ISCC-NBS Centroid Colors.cxf", nullptr, 0);
-    ASSERT_NE(book, nullptr);
-    EXPECT_STREQ(BPColorBookGetName(book), "ISCC-NBS Centroid Colors");
-    ASSERT_EQ(BPColorBookGetColorCount(book), BPCentroidGetCount());
-    for (int index = 0; index < BPColorBookGetColorCount(book); ++index) {
-        const int tags = BPColorBookGetColorTagCount(book, index);
-        ASSERT_GT(tags, 0);
-        int centroid = 0;
-        ASSERT_EQ(std::sscanf(BPColorBookGetColorTag(book, index, tags - 1), "centroid %d", &centroid), 1);
-        EXPECT_STREQ(BPColorBookGetColorName(book, index), BPCentroidGetName(centroid));
-        EXPECT_STREQ(BPColorBookGetColorCategory(book, index),
-                     BPCentroidGetCategoryName(BPCentroidGetCategory(centroid)));
-        Triple lab;
-        ASSERT_EQ(BPColorBookGetColorLab(book, index, lab.values), 1);
-        for (int i = 0; i < 3; ++i) EXPECT_NEAR(lab.values[i], BPCentroidGetLab(centroid)[i], 1e-4);
-    }
-    BPColorBookClose(book);
-}
-
 struct HtmlCase {
     double srgb[3];
     const char* code;
@@ -245,13 +223,6 @@ TEST_F(PaletteInterface, ListsSystemThenUserPalettesWithNamesPathsAndKinds) {
     EXPECT_EQ(BPPaletteListGetCount(nullptr), 0);
     BPPaletteListFree(list);
     BPPaletteListFree(nullptr);
-}
-
-TEST_F(PaletteInterface, NoFoldersGiveAnEmptyList) {
-    BPPaletteList* list = BPPaletteListFind();
-    ASSERT_NE(list, nullptr);
-    EXPECT_EQ(BPPaletteListGetCount(list), 0);
-    BPPaletteListFree(list);
 }
 
 }  // namespace

@@ -125,19 +125,6 @@ static void CheckDifferences(void) {
     };
     const double want[] = {5.0, 25.0, 3.42184, 3.50099, 5.44188, 5.52394, 5.50085, 2.0425, -1.0, -1.0};
     Check("differences", got, want, (int)(sizeof want / sizeof want[0]), 5e-5);
-
-    /* The array forms over the same pairs, laid row after row. */
-    const double firsts[12] = {50, 0, 0, 50, 20, -30, 50, 20, -30, 50, 2.6772, -79.7751};
-    const double seconds[12] = {50, 3, 4, 55, 18, -25, 55, 18, -25, 50, 0, -82.7485};
-    double rows[4];
-    CheckStatus("BPCalculateDeltaEArray", BPCalculateDeltaEArray(firsts, seconds, rows, 1), 1);
-    CheckStatus("BPCalculateDeltaECMCArray",
-                BPCalculateDeltaECMCArray(firsts + 3, seconds + 3, rows + 1, 1, 2, 1), 1);
-    CheckStatus("BPCalculateDeltaE94Array",
-                BPCalculateDeltaE94Array(firsts + 6, seconds + 6, rows + 2, 1, 1, 1, 1), 1);
-    CheckStatus("BPCalculateDeltaE2000Array",
-                BPCalculateDeltaE2000Array(firsts + 9, seconds + 9, rows + 3, 1, 1, 1, 1), 1);
-    Check("array differences", rows, (const double[]){5.0, 3.42184, 5.44188, 2.0425}, 4, 5e-5);
 }
 
 static void CheckHarmonies(void) {

@@ -57,8 +57,9 @@ listed=$(env -u PIGMO_INSTALL_LOCATION bash -c 'exec -a /nowhere/bin/pigmo "$0" 
 
 # The installed Python package loads the installed library by itself, with nothing pointing at it.
 preload=""
-# A sanitized library needs the sanitizer runtime loaded before Python starts.
-[ -n "$flags" ] && preload=$("$cxx" -print-file-name=libasan.so)
+# A sanitized library needs the sanitizer runtime, and the C++ runtime it follows exceptions in, loaded
+# before Python starts.
+[ -n "$flags" ] && preload="$("$cxx" -print-file-name=libasan.so) $("$cxx" -print-file-name=libstdc++.so)"
 got=$(cd "$work" && env -u PIGMO_LIBRARY PYTHONPATH="$prefix/lib/python3/dist-packages" LD_PRELOAD="$preload" \
   ASAN_OPTIONS=detect_leaks=0 /usr/bin/python3 -c \
   'import pigmo; print(*(f"{v:.2f}" for v in pigmo.lab_to_srgb((50, 0, 0))), pigmo.palettes()[0].name)') \
