@@ -67,17 +67,20 @@ std::vector<double> Inputs(uint64_t seed, const std::vector<Range>& ranges, int 
 
 // Thresholds of the formulas (L* 8 is f = 0.2069, sRGB 10.31475 is c = 0.04045), axes, the ends
 // of the ranges and beyond them.
-const std::vector<double> kLabEdges = {
-    0, 0, 0, 100, 0, 0, 50, 0, 0, 8.0004, 0, 0, 7.9996, 0, 0, 8.0004, 40, -40, 50, 0, -10, 50, -10, 0,
-    10, 0, 100, 150, 0, 0, -5, 20, 20, 50, 128, -128, 100, 300, -300, 1e-300, 0, 0, 0, 0, 1e-12, 60, -0.0, 0};
-const std::vector<double> kRgbEdges = {0,     0,   0,   255, 255,  255,   10.31475, 0, 0, 10.3148, 128, 255,
-                                       255,   0,   0,   0,   255,  0,     0,        0, 255, 1,     2,   3,
-                                       300,   -10, 128, 254, 0.25, 1e-300, 127.5,   127.5, 127.5};
-const std::vector<double> kLchEdges = {50, 10, 0,   50, 10,  90,   50, 10,  180,  50, 10, 270, 50, 10, 359.9999999,
-                                      50, 10, 360, 50, 10,  405,  50, 10,  -135, 50, 0,  33,  50, 10, 89.9999999,
-                                      50, 10, 90.0000001, 0, 0, 0, 100, 150, 123.4, 50, 10, 269.99999999};
-const std::vector<double> kXyzEdges = {0,    0, 0,   0.96422, 1, 0.82521, 0.9505, 1, 1.089, 0.0089, 0.008856, 0.0089,
-                                       -0.1, 0.5, 0.2, 2, 2, 2, 1e-9, 1e-9, 1e-9};
+const std::vector<double> kLabEdges = {0,      0,   0,    100,    0,  0,   50, 0,  0,     8.0004, 0,    0,
+                                       7.9996, 0,   0,    8.0004, 40, -40, 50, 0,  -10,   50,     -10,  0,
+                                       10,     0,   100,  150,    0,  0,   -5, 20, 20,    50,     128,  -128,
+                                       100,    300, -300, 1e-300, 0,  0,   0,  0,  1e-12, 60,     -0.0, 0};
+const std::vector<double> kRgbEdges = {0,   0,   0,   255, 255, 255, 10.31475, 0,      0,     10.3148, 128,
+                                       255, 255, 0,   0,   0,   255, 0,        0,      0,     255,     1,
+                                       2,   3,   300, -10, 128, 254, 0.25,     1e-300, 127.5, 127.5,   127.5};
+const std::vector<double> kLchEdges = {
+    50,          10,         0,  50,  10,         90, 50,  10, 180, 50,   10,    270, 50, 10,
+    359.9999999, 50,         10, 360, 50,         10, 405, 50, 10,  -135, 50,    0,   33, 50,
+    10,          89.9999999, 50, 10,  90.0000001, 0,  0,   0,  100, 150,  123.4, 50,  10, 269.99999999};
+const std::vector<double> kXyzEdges = {0,   0,     0,      0.96422,  1,      0.82521, 0.9505,
+                                       1,   1.089, 0.0089, 0.008856, 0.0089, -0.1,    0.5,
+                                       0.2, 2,     2,      2,        1e-9,   1e-9,    1e-9};
 
 ColorSpaceStruct Plain(int32_t code) {
     ColorSpaceStruct description;
@@ -121,8 +124,10 @@ std::vector<Path> Conversions() {
     std::vector<Path> paths = {
         {"BPConvertsRGB2Lab", 3, 3, 1, Inputs(1, rgb, 250, kRgbEdges), Exported(BPConvertsRGB2Lab)},
         {"BPConvertLab2sRGB", 3, 3, 1, Inputs(2, lab, 250, kLabEdges), Exported(BPConvertLab2sRGB)},
-        {"BPConvertsLinearRGB2Lab", 3, 3, 1, Inputs(3, rgb, 250, kRgbEdges), Exported(BPConvertsLinearRGB2Lab)},
-        {"BPConvertLab2LinearsRGB", 3, 3, 255, Inputs(4, lab, 250, kLabEdges), Exported(BPConvertLab2LinearsRGB)},
+        {"BPConvertsLinearRGB2Lab", 3, 3, 1, Inputs(3, rgb, 250, kRgbEdges),
+         Exported(BPConvertsLinearRGB2Lab)},
+        {"BPConvertLab2LinearsRGB", 3, 3, 255, Inputs(4, lab, 250, kLabEdges),
+         Exported(BPConvertLab2LinearsRGB)},
         {"BPConvertLCh2Lab", 3, 3, 1, Inputs(5, lch, 250, kLchEdges), Exported(BPConvertLCh2Lab)},
         {"BPConvertLab2LCh", 3, 3, 1, Inputs(6, lab, 250, kLabEdges), Exported(BPConvertLab2LCh)},
         {"BPConvert36BandSpectral2LabD502", 36, 3, 1, Inputs(7, spectrum, 150, spectrumEdges),
@@ -141,8 +146,7 @@ std::vector<Path> Conversions() {
     for (const Space& from : spaces) {
         for (const Space& to : spaces) {
             ++seed;
-            const bool exported = (from.code == 3) != (to.code == 3) &&
-                                  from.code != 6 && to.code != 6;
+            const bool exported = (from.code == 3) != (to.code == 3) && from.code != 6 && to.code != 6;
             if (exported || from.code == to.code) continue;
             paths.push_back({std::string(from.name) + "->" + to.name, 3, 3, to.scale,
                              Inputs(seed, from.ranges, 80, *from.edges),
@@ -172,18 +176,17 @@ std::vector<Path> Conversions() {
 std::vector<Path> AppearanceSpaces() {
     std::vector<Path> paths;
     ColorSpaceStruct xyz = Plain(6);
-    for (int32_t code = 10;
-         code <= 21; ++code) {
+    for (int32_t code = 10; code <= 21; ++code) {
         ColorSpaceStruct appearance = Plain(code);
         appearance.ApplyViewingPreset(4);
         const bool brightness = code >= 16;
         const bool cartesian = (code - 10) % 6 >= 3;
         const Range lightness = brightness ? Range{5, 150} : Range{1, 100};
-        const std::vector<Range> correlates =
-            cartesian ? std::vector<Range>{lightness, {-60, 60}, {-60, 60}}
-                      : std::vector<Range>{lightness, {0, 70}, {0, 360}};
+        const std::vector<Range> correlates = cartesian ? std::vector<Range>{lightness, {-60, 60}, {-60, 60}}
+                                                        : std::vector<Range>{lightness, {0, 70}, {0, 360}};
         const std::string name = "ciecam02 code " + std::to_string(code);
-        paths.push_back({"xyz->" + name, 3, 3, 1, Inputs(300 + code, {{0, 1}, {0, 1}, {0, 1.1}}, 25, kXyzEdges),
+        paths.push_back({"xyz->" + name, 3, 3, 1,
+                         Inputs(300 + code, {{0, 1}, {0, 1}, {0, 1.1}}, 25, kXyzEdges),
                          Engine(xyz, appearance, AdaptationMethod::None)});
         paths.push_back({name + "->xyz", 3, 3, 100, Inputs(400 + code, correlates, 25),
                          Engine(appearance, xyz, AdaptationMethod::None)});
@@ -195,15 +198,16 @@ std::vector<Path> AppearanceSpaces() {
 // a hue difference of exactly 180 degrees, one color without chroma), then random pairs, half of
 // them close together.
 std::vector<double> PairInputs(uint64_t seed, int count) {
-    std::vector<double> pairs = {50, 2.6772, -79.7751, 50,   0,  -82.7485, 50, 0,    0,   50, -1,   2,
-                                 50, 2.49,   -0.001,   50,   -2.49, 0.0009, 50, 2.5, 0,   50, 0,    -2.5,
-                                 50, 10,     0,        50,   -10, 0,        50, 0,    10,  50, 0,    -10,
-                                 50, 0,      0,        50,   0,   0,        60, 20,   -30, 60, 20,   -30,
-                                 10, 0,      0,        90,   0,   0,        50, 20,   -30, 55, 18,   -25,
-                                 16, 30,     30,       20,   30,  30,       50, -20,  -1e-12, 50, -20, 1e-12};
+    std::vector<double> pairs = {50, 2.6772, -79.7751, 50, 0,     -82.7485, 50, 0,   0,      50, -1,  2,
+                                 50, 2.49,   -0.001,   50, -2.49, 0.0009,   50, 2.5, 0,      50, 0,   -2.5,
+                                 50, 10,     0,        50, -10,   0,        50, 0,   10,     50, 0,   -10,
+                                 50, 0,      0,        50, 0,     0,        60, 20,  -30,    60, 20,  -30,
+                                 10, 0,      0,        90, 0,     0,        50, 20,  -30,    55, 18,  -25,
+                                 16, 30,     30,       20, 30,    30,       50, -20, -1e-12, 50, -20, 1e-12};
     Random random(seed);
     for (int i = 0; i < count; ++i) {
-        const double reference[3] = {random.Uniform(0, 100), random.Uniform(-110, 110), random.Uniform(-110, 110)};
+        const double reference[3] = {random.Uniform(0, 100), random.Uniform(-110, 110),
+                                     random.Uniform(-110, 110)};
         pairs.insert(pairs.end(), reference, reference + 3);
         for (int k = 0; k < 3; ++k) {
             const bool near = i % 2 == 1;
@@ -225,9 +229,11 @@ std::vector<Path> Metrics() {
         metric("BPCalculateDeltaECMC 2:1", [](auto a, auto b) { return BPCalculateDeltaECMC(a, b, 2, 1); }),
         metric("BPCalculateDeltaECMC 1:1", [](auto a, auto b) { return BPCalculateDeltaECMC(a, b, 1, 1); }),
         metric("BPCalculateDeltaE94", [](auto a, auto b) { return BPCalculateDeltaE94(a, b, 1, 1, 1); }),
-        metric("BPCalculateDeltaE94 textiles", [](auto a, auto b) { return BPCalculateDeltaE94(a, b, 2, 1, 1); }),
+        metric("BPCalculateDeltaE94 textiles",
+               [](auto a, auto b) { return BPCalculateDeltaE94(a, b, 2, 1, 1); }),
         metric("BPCalculateDeltaE2000", [](auto a, auto b) { return BPCalculateDeltaE2000(a, b, 1, 1, 1); }),
-        metric("BPCalculateDeltaE2000 2:1:1", [](auto a, auto b) { return BPCalculateDeltaE2000(a, b, 2, 1, 1); }),
+        metric("BPCalculateDeltaE2000 2:1:1",
+               [](auto a, auto b) { return BPCalculateDeltaE2000(a, b, 2, 1, 1); }),
     };
 }
 
@@ -289,7 +295,8 @@ void Record(const char* file) {
 
 // NaN and infinities must stay what they were; finite values within the tolerance.
 double Difference(double recorded, double now, double scale) {
-    if (std::isnan(recorded) || std::isnan(now)) return std::isnan(recorded) && std::isnan(now) ? 0.0 : INFINITY;
+    if (std::isnan(recorded) || std::isnan(now))
+        return std::isnan(recorded) && std::isnan(now) ? 0.0 : INFINITY;
     if (std::isinf(recorded) || std::isinf(now)) return recorded == now ? 0.0 : INFINITY;
     return std::fabs(recorded - now) * scale;
 }
