@@ -79,9 +79,12 @@ LIBRARY_NAME = "libpigmo.so"
 
 def candidates() -> list[tuple[str, str]]:
     """Where the library is looked for, in order, as (what, path or name) pairs."""
-    # Installed as <prefix>/lib/python3/dist-packages/pigmo/, beside <prefix>/lib/libpigmo.so.
-    installed = Path(__file__).resolve().parent.parents[2] / LIBRARY_NAME
-    places = [("beside the installed package", str(installed))]
+    # Installed as <prefix>/lib/python3/dist-packages/pigmo/, beside <prefix>/lib/libpigmo.so. Elsewhere
+    # (a source tree) the folders above mean nothing, and a stray library there must not be loaded.
+    package = Path(__file__).resolve().parent
+    places = []
+    if [folder.name for folder in list(package.parents)[:3]] == ["dist-packages", "python3", "lib"]:
+        places.append(("beside the installed package", str(package.parents[2] / LIBRARY_NAME)))
     override = os.environ.get("PIGMO_LIBRARY")
     if override:
         places.append(("PIGMO_LIBRARY", override))

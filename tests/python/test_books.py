@@ -138,12 +138,13 @@ def test_palettes_lists_system_then_user_books(tmp_path, palette_dir):
 
 
 def test_import_says_where_it_looked(tmp_path):
-    package = Path(pigmo.__file__).parent
-    shutil.copytree(package, tmp_path / "pigmo", ignore=shutil.ignore_patterns("__pycache__"))
-    run = _python("import pigmo", PYTHONPATH=str(tmp_path), PIGMO_LIBRARY=str(tmp_path / "nowhere.so"))
+    # An installed layout without its library.
+    packages = tmp_path / "lib" / "python3" / "dist-packages"
+    shutil.copytree(Path(pigmo.__file__).parent, packages / "pigmo", ignore=shutil.ignore_patterns("__pycache__"))
+    run = _python("import pigmo", PYTHONPATH=str(packages), PIGMO_LIBRARY=str(tmp_path / "nowhere.so"))
     assert run.returncode != 0
     message = run.stderr.strip().splitlines()[-1]
     assert message.startswith("ImportError: pigmo: cannot load libpigmo.so; looked at")
-    beside_prefix = (tmp_path / "pigmo").parents[2] / "libpigmo.so"
+    beside_prefix = tmp_path / "lib" / "libpigmo.so"
     for place in (str(beside_prefix), str(tmp_path / "nowhere.so"), "system's library path"):
         assert place in message
